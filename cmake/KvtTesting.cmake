@@ -1,0 +1,25 @@
+# kvt_add_test(<name> SOURCES <file>... [LIBS <target>...] [ENV <VAR=value>...])
+#
+# Builds a QtTest executable and registers it with CTest. Every test runs on
+# the offscreen platform with a home, settings and data folder of its own under
+# the build tree, wiped before each run, so no test reads or writes the user's
+# real configuration.
+set(KVT_TEST_HOME_ROOT "${PROJECT_BINARY_DIR}/test-home")
+
+if(NOT TEST kvt_wipe_test_home)
+    add_test(NAME kvt_wipe_test_home
+             COMMAND ${CMAKE_COMMAND} -E rm -rf "${KVT_TEST_HOME_ROOT}")
+    set_tests_properties(kvt_wipe_test_home PROPERTIES FIXTURES_SETUP kvt_test_home)
+endif()
+
+function(kvt_add_test name)
+    cmake_parse_arguments(ARG "" "" "SOURCES;LIBS;ENV" ${ARGN})
+    add_executable(${name} ${ARG_SOURCES})
+    target_link_libraries(${name} PRIVATE KvtCommon::KvtCommon kvttestsupport Qt5::Test ${ARG_LIBS})
+    set(home "${KVT_TEST_HOME_ROOT}/${name}")
+    add_test(NAME ${name} COMMAND ${name})
+    set_tests_properties(${name} PROPERTIES
+        FIXTURES_REQUIRED kvt_test_home
+        TIMEOUT 300
+        ENVIRONMENT "QT_QPA_PLATFORM=offscreen;HOME=${home};XDG_CONFIG_HOME=${home}/config;XDG_DATA_HOME=${home}/data;XDG_CACHE_HOME=${home}/cache;LC_ALL=C.UTF-8;LANG=C.UTF-8;KVT_TEST_HOME=${home};${ARG_ENV}")
+endfunction()

@@ -1,0 +1,368 @@
+#include "treenode.h"
+
+#include <QHash>
+
+#include <algorithm>
+
+namespace {
+
+// Row hints live outside the node so that the class layout stays fixed. A
+// hint is only ever a guess that is verified before use, so a stale entry
+// (a node destroyed in another thread than the one that looked it up) costs
+// memory, never correctness.
+thread_local QHash<const TreeNode *, int> rowHints;
+
+void rememberRow(const TreeNode *node, int row)
+{
+    rowHints.insert(node, row);
+}
+
+bool lessByDepthThenId(const TreeNode *a, const TreeNode *b)
+{
+    if (a->expectedDepth() != b->expectedDepth())
+        return a->expectedDepth() < b->expectedDepth();
+    return a->id() < b->id();
+}
+
+} // namespace
+
+TreeNode::TreeNode(QObject *parent)
+    : TreeNode(-1, QString(), parent)
+{
+}
+
+TreeNode::TreeNode(int expectedDepth, const QString &expectedParentId, QObject *parent)
+    : QObject(parent)
+    , _parentNode(nullptr)
+    , _expectedParentId(expectedParentId)
+    , _expectedDepth(expectedDepth)
+{
+}
+
+TreeNode::~TreeNode()
+{
+    reset();
+    rowHints.remove(this);
+}
+
+void TreeNode::insert(int position, const QList<TreeNode *> &nodes)
+{
+    QList<TreeNode *> incoming;
+    incoming.reserve(nodes.size());
+    for (TreeNode *node : nodes) {
+        if (node && node != this && !incoming.contains(node))
+            incoming.append(node);
+    }
+    if (incoming.isEmpty())
+        return;
+
+    // A node lives in one list at a time. Inserting a node that is still
+    // attached elsewhere moves it, with the removal announced by its old
+    // parent; otherwise it would sit in two lists and outlive one of them.
+    for (TreeNode *node : qAsConst(incoming)) {
+        if (node->_parentNode)
+            node->_parentNode->removeOne(node);
+    }
+
+    if (position > 0)
+        position = qMin(position, childNodesCount());
+    else
+        position = 0;
+    const int count = incoming.size();
+
+    Q_EMIT nodesAboutToBeInserted(this, position, position + count - 1);
+    for (int i = 0; i < count; ++i)
+        incoming.at(i)->setParentNode(this);
+    if (position == _childNodes.size()) {
+        _childNodes.append(incoming);
+    } else {
+        QList<TreeNode *> merged;
+        merged.reserve(_childNodes.size() + count);
+        merged.append(_childNodes.mid(0, position));
+        merged.append(incoming);
+        merged.append(_childNodes.mid(position));
+        _childNodes.swap(merged);
+    }
+    for (int i = 0; i < count; ++i)
+        rememberRow(incoming.at(i), position + i);
+    Q_EMIT nodesInserted();
+
+    // Connected only now, so that the announcement above is heard once.
+    for (TreeNode *node : qAsConst(incoming))
+        connectChildSignals(node);
+}
+
+void TreeNode::removeAt(int position, int count)
+{
+    const int size = childNodesCount();
+    if (size == 0 || position < 0 || position >= size || count < 1)
+        return;
+    count = qMin(count, size - position);
+    const int last = position + count - 1;
+
+    for (int i = position; i <= last; ++i)
+        disconnectChildSignals(_childNodes.at(i));
+
+    Q_EMIT nodesAboutToBeRemoved(this, position, last);
+    for (int i = position; i <= last; ++i)
+        _childNodes.at(i)->setParentNode(nullptr);
+    _childNodes.erase(_childNodes.begin() + position, _childNodes.begin() + last + 1);
+    Q_EMIT nodesRemoved();
+}
+
+void TreeNode::setAlternativeExpected(int)
+{
+}
+
+void TreeNode::afterLoad()
+{
+}
+
+int TreeNode::treeNodeSpecialFlags() const
+{
+    return 0;
+}
+
+int TreeNode::columnCount() const
+{
+    return 0;
+}
+
+QVariant TreeNode::headerData(int, Qt::Orientation, int) const
+{
+    return QVariant();
+}
+
+QVariant TreeNode::data(int, int role) const
+{
+    switch (role) {
+    case Qt::UserRole + 2:
+        return _id;
+    case Qt::UserRole + 3:
+        return _expectedParentId;
+    default:
+        return QVariant();
+    }
+}
+
+bool TreeNode::setData(int, const QVariant &, int)
+{
+    return false;
+}
+
+Qt::ItemFlags TreeNode::flags(int) const
+{
+    return Qt::ItemIsSelectable | Qt::ItemIsEnabled;
+}
+
+bool TreeNode::canFetchMore() const
+{
+    return false;
+}
+
+void TreeNode::fetchMore()
+{
+}
+
+void TreeNode::append(TreeNode *node)
+{
+    insert(childNodesCount(), QList<TreeNode *>{node});
+}
+
+void TreeNode::append(const QList<TreeNode *> &nodes)
+{
+    insert(childNodesCount(), nodes);
+}
+
+void TreeNode::insert(int position, TreeNode *node)
+{
+    insert(position, QList<TreeNode *>{node});
+}
+
+void TreeNode::clear()
+{
+    removeAt(0, childNodesCount());
+}
+
+void TreeNode::clearDelete()
+{
+    const QList<TreeNode *> children = _childNodes;
+    clear();
+    qDeleteAll(children);
+}
+
+void TreeNode::clearDeleteAll()
+{
+    const QList<TreeNode *> children = _childNodes;
+    clear();
+    for (TreeNode *child : children) {
+        child->clearDeleteAll();
+        delete child;
+    }
+}
+
+bool TreeNode::contains(TreeNode *node) const
+{
+    return _childNodes.contains(node);
+}
+
+int TreeNode::indexOf(TreeNode *node, int from) const
+{
+    return _childNodes.indexOf(node, from);
+}
+
+bool TreeNode::removeOne(TreeNode *node)
+{
+    int index = -1;
+    if (node && node->_parentNode == this)
+        index = node->row();
+    if (index < 0)
+        index = _childNodes.indexOf(node);
+    if (index < 0)
+        return false;
+    removeAt(index, 1);
+    return true;
+}
+
+void TreeNode::reset()
+{
+    if (_parentNode)
+        _parentNode->removeOne(this);
+    clear();
+}
+
+QList<TreeNode *> TreeNode::allChildNodes() const
+{
+    QList<TreeNode *> result = _childNodes;
+    for (const TreeNode *child : _childNodes)
+        result.append(child->_childNodes);
+    return result;
+}
+
+void TreeNode::loadTreeFromList(const QList<TreeNode *> &nodes)
+{
+    clear();
+
+    QList<TreeNode *> list = nodes;
+    std::sort(list.begin(), list.end(), lessByDepthThenId);
+    list.prepend(this);
+
+    int currentDepth = _expectedDepth;
+    int levelStart = 0;
+    int previousLevelStart = -1;
+    // First node of the previous level for each id, so that a level of many
+    // parents is not scanned once per child. Only the first match counts, as
+    // a linear scan in list order would find.
+    QHash<QString, TreeNode *> previousLevel;
+    QList<TreeNode *> attached;
+
+    for (int i = 1; i < list.size(); ++i) {
+        TreeNode *node = list.at(i);
+        if (node->_expectedDepth != currentDepth) {
+            currentDepth = node->_expectedDepth;
+            previousLevelStart = levelStart;
+            levelStart = i;
+            previousLevel.clear();
+            for (int j = qMax(previousLevelStart, 0); j < levelStart; ++j) {
+                TreeNode *candidate = list.at(j);
+                // Candidates all share one depth except the root at index 0.
+                if (candidate->_expectedDepth + 1 == currentDepth
+                    && !previousLevel.contains(candidate->_id))
+                    previousLevel.insert(candidate->_id, candidate);
+            }
+        }
+        TreeNode *parent = previousLevel.value(node->_expectedParentId);
+        if (parent) {
+            parent->append(node);
+            attached.append(node);
+        }
+    }
+
+    for (TreeNode *node : qAsConst(attached))
+        node->afterLoad();
+}
+
+void TreeNode::connectChildSignals(TreeNode *child)
+{
+    if (!child)
+        return;
+    connect(child, SIGNAL(nodesAboutToBeInserted(TreeNode*,int,int)),
+            this, SIGNAL(nodesAboutToBeInserted(TreeNode*,int,int)));
+    connect(child, SIGNAL(nodesAboutToBeRemoved(TreeNode*,int,int)),
+            this, SIGNAL(nodesAboutToBeRemoved(TreeNode*,int,int)));
+    connect(child, SIGNAL(nodesInserted()), this, SIGNAL(nodesInserted()));
+    connect(child, SIGNAL(nodesRemoved()), this, SIGNAL(nodesRemoved()));
+    connect(child, SIGNAL(nodeDataChanged(TreeNode*)), this, SIGNAL(nodeDataChanged(TreeNode*)));
+    connect(child, SIGNAL(nodeChildsDataChanged(TreeNode*)),
+            this, SIGNAL(nodeChildsDataChanged(TreeNode*)));
+    connect(child, SIGNAL(setCurrentNode(TreeNode*)), this, SIGNAL(setCurrentNode(TreeNode*)));
+    connect(child, SIGNAL(expandCurrentNode(TreeNode*)), this, SIGNAL(expandCurrentNode(TreeNode*)));
+}
+
+void TreeNode::disconnectChildSignals(TreeNode *child)
+{
+    if (!child)
+        return;
+    disconnect(child, SIGNAL(nodesAboutToBeInserted(TreeNode*,int,int)),
+               this, SIGNAL(nodesAboutToBeInserted(TreeNode*,int,int)));
+    disconnect(child, SIGNAL(nodesAboutToBeRemoved(TreeNode*,int,int)),
+               this, SIGNAL(nodesAboutToBeRemoved(TreeNode*,int,int)));
+    disconnect(child, SIGNAL(nodesInserted()), this, SIGNAL(nodesInserted()));
+    disconnect(child, SIGNAL(nodesRemoved()), this, SIGNAL(nodesRemoved()));
+    disconnect(child, SIGNAL(nodeDataChanged(TreeNode*)), this, SIGNAL(nodeDataChanged(TreeNode*)));
+    disconnect(child, SIGNAL(nodeChildsDataChanged(TreeNode*)),
+               this, SIGNAL(nodeChildsDataChanged(TreeNode*)));
+    disconnect(child, SIGNAL(setCurrentNode(TreeNode*)), this, SIGNAL(setCurrentNode(TreeNode*)));
+    disconnect(child, SIGNAL(expandCurrentNode(TreeNode*)),
+               this, SIGNAL(expandCurrentNode(TreeNode*)));
+}
+
+int TreeNode::row() const
+{
+    if (!_parentNode)
+        return -1;
+    const QList<TreeNode *> &siblings = _parentNode->_childNodes;
+    const int size = siblings.size();
+    const int hint = rowHints.value(this, -1);
+    if (hint >= 0 && hint < size && siblings.at(hint) == this)
+        return hint;
+
+    // Search outwards from the hint: an insertion or removal nearby shifts a
+    // node by a few rows, so it is usually found within a few steps.
+    const int start = qBound(0, hint, size - 1);
+    for (int distance = 0; distance < size; ++distance) {
+        const int above = start - distance;
+        const int below = start + distance;
+        if (above < 0 && below >= size)
+            break;
+        if (below < size && siblings.at(below) == this) {
+            rememberRow(this, below);
+            return below;
+        }
+        if (above >= 0 && siblings.at(above) == this) {
+            rememberRow(this, above);
+            return above;
+        }
+    }
+    return -1;
+}
+
+void TreeNode::emitNodeDataChanged()
+{
+    Q_EMIT nodeDataChanged(this);
+}
+
+void TreeNode::emitNodeChildsDataChanged()
+{
+    Q_EMIT nodeChildsDataChanged(this);
+}
+
+void TreeNode::emitSetCurrentNode()
+{
+    Q_EMIT setCurrentNode(this);
+}
+
+void TreeNode::emitExpandCurrentNode()
+{
+    Q_EMIT expandCurrentNode(this);
+}
