@@ -1,16 +1,118 @@
 #include "treenode.h"
 
-#include <QHash>
+#include <QMetaMethod>
+#include <QVector>
+#include <QtAlgorithms>
 
 #include <algorithm>
+#include <cstdlib>
 
 namespace {
 
-// Row hints live outside the node so that the class layout stays fixed. A
-// hint is only ever a guess that is verified before use, so a stale entry
-// (a node destroyed in another thread than the one that looked it up) costs
-// memory, never correctness.
-thread_local QHash<const TreeNode *, int> rowHints;
+// Where each node was last seen in its parent's list. The hints live outside
+// the node so that the class layout stays fixed. A hint is only a guess that
+// is verified before use, so a stale entry (a node destroyed in another thread
+// than the one that looked it up) costs memory, never correctness.
+//
+// An open-addressing table keeps key and row in one slot: a lookup of a node
+// among many thousands costs one cache line, as a hint stored in the node
+// itself would.
+class RowHints
+{
+public:
+    ~RowHints() { std::free(m_slots); }
+
+    int value(const TreeNode *node) const
+    {
+        if (!m_slots)
+            return -1;
+        for (std::size_t i = slotOf(node);; i = (i + 1) & m_mask) {
+            const Slot &slot = m_slots[i];
+            if (slot.node == node)
+                return slot.row;
+            if (!slot.node)
+                return -1;
+        }
+    }
+
+    void insert(const TreeNode *node, int row)
+    {
+        if ((m_count + 1) * 2 > m_mask + 1)
+            grow();
+        for (std::size_t i = slotOf(node);; i = (i + 1) & m_mask) {
+            Slot &slot = m_slots[i];
+            if (slot.node == node) {
+                slot.row = row;
+                return;
+            }
+            if (!slot.node) {
+                slot = Slot{node, row};
+                ++m_count;
+                return;
+            }
+        }
+    }
+
+    void remove(const TreeNode *node)
+    {
+        if (!m_slots)
+            return;
+        std::size_t hole = slotOf(node);
+        while (m_slots[hole].node != node) {
+            if (!m_slots[hole].node)
+                return;
+            hole = (hole + 1) & m_mask;
+        }
+        // Shift later members of the probe run back into the hole, so that
+        // lookups never need tombstones.
+        for (std::size_t i = (hole + 1) & m_mask; m_slots[i].node; i = (i + 1) & m_mask) {
+            const std::size_t home = slotOf(m_slots[i].node);
+            if (((i - home) & m_mask) >= ((i - hole) & m_mask)) {
+                m_slots[hole] = m_slots[i];
+                hole = i;
+            }
+        }
+        m_slots[hole] = Slot{};
+        --m_count;
+    }
+
+private:
+    struct Slot
+    {
+        const TreeNode *node = nullptr;
+        int row = -1;
+    };
+
+    std::size_t slotOf(const TreeNode *node) const
+    {
+        return std::size_t((quint64(quintptr(node)) * Q_UINT64_C(0x9E3779B97F4A7C15)) >> m_shift) & m_mask;
+    }
+
+    void grow()
+    {
+        Slot *old = m_slots;
+        const std::size_t oldSize = old ? m_mask + 1 : 0;
+        const std::size_t size = oldSize ? oldSize * 2 : 64;
+        m_slots = static_cast<Slot *>(std::calloc(size, sizeof(Slot)));
+        if (!m_slots)
+            qBadAlloc();
+        m_mask = size - 1;
+        m_shift = 64 - qCountTrailingZeroBits(quint64(size));
+        m_count = 0;
+        for (std::size_t i = 0; i < oldSize; ++i) {
+            if (old[i].node)
+                insert(old[i].node, old[i].row);
+        }
+        std::free(old);
+    }
+
+    Slot *m_slots = nullptr;
+    std::size_t m_mask = 0;
+    std::size_t m_count = 0;
+    int m_shift = 64;
+};
+
+thread_local RowHints rowHints;
 
 void rememberRow(const TreeNode *node, int row)
 {
@@ -282,39 +384,50 @@ void TreeNode::loadTreeFromList(const QList<TreeNode *> &nodes)
         node->afterLoad();
 }
 
+namespace {
+
+// The eight notification signals, looked up once. Connecting by meta-method
+// makes exactly the connections that the SIGNAL() form makes (they can be
+// broken with either form), without parsing eight signatures on every
+// insertion: a tree of many thousand nodes is hung node by node.
+const QVector<QMetaMethod> &notificationSignals()
+{
+    static const QVector<QMetaMethod> methods = [] {
+        const char *const signatures[] = {
+            "nodesAboutToBeInserted(TreeNode*,int,int)",
+            "nodesAboutToBeRemoved(TreeNode*,int,int)",
+            "nodesInserted()",
+            "nodesRemoved()",
+            "nodeDataChanged(TreeNode*)",
+            "nodeChildsDataChanged(TreeNode*)",
+            "setCurrentNode(TreeNode*)",
+            "expandCurrentNode(TreeNode*)",
+        };
+        QVector<QMetaMethod> result;
+        const QMetaObject &meta = TreeNode::staticMetaObject;
+        for (const char *signature : signatures)
+            result.append(meta.method(meta.indexOfSignal(signature)));
+        return result;
+    }();
+    return methods;
+}
+
+} // namespace
+
 void TreeNode::connectChildSignals(TreeNode *child)
 {
     if (!child)
         return;
-    connect(child, SIGNAL(nodesAboutToBeInserted(TreeNode*,int,int)),
-            this, SIGNAL(nodesAboutToBeInserted(TreeNode*,int,int)));
-    connect(child, SIGNAL(nodesAboutToBeRemoved(TreeNode*,int,int)),
-            this, SIGNAL(nodesAboutToBeRemoved(TreeNode*,int,int)));
-    connect(child, SIGNAL(nodesInserted()), this, SIGNAL(nodesInserted()));
-    connect(child, SIGNAL(nodesRemoved()), this, SIGNAL(nodesRemoved()));
-    connect(child, SIGNAL(nodeDataChanged(TreeNode*)), this, SIGNAL(nodeDataChanged(TreeNode*)));
-    connect(child, SIGNAL(nodeChildsDataChanged(TreeNode*)),
-            this, SIGNAL(nodeChildsDataChanged(TreeNode*)));
-    connect(child, SIGNAL(setCurrentNode(TreeNode*)), this, SIGNAL(setCurrentNode(TreeNode*)));
-    connect(child, SIGNAL(expandCurrentNode(TreeNode*)), this, SIGNAL(expandCurrentNode(TreeNode*)));
+    for (const QMetaMethod &signal : notificationSignals())
+        connect(child, signal, this, signal);
 }
 
 void TreeNode::disconnectChildSignals(TreeNode *child)
 {
     if (!child)
         return;
-    disconnect(child, SIGNAL(nodesAboutToBeInserted(TreeNode*,int,int)),
-               this, SIGNAL(nodesAboutToBeInserted(TreeNode*,int,int)));
-    disconnect(child, SIGNAL(nodesAboutToBeRemoved(TreeNode*,int,int)),
-               this, SIGNAL(nodesAboutToBeRemoved(TreeNode*,int,int)));
-    disconnect(child, SIGNAL(nodesInserted()), this, SIGNAL(nodesInserted()));
-    disconnect(child, SIGNAL(nodesRemoved()), this, SIGNAL(nodesRemoved()));
-    disconnect(child, SIGNAL(nodeDataChanged(TreeNode*)), this, SIGNAL(nodeDataChanged(TreeNode*)));
-    disconnect(child, SIGNAL(nodeChildsDataChanged(TreeNode*)),
-               this, SIGNAL(nodeChildsDataChanged(TreeNode*)));
-    disconnect(child, SIGNAL(setCurrentNode(TreeNode*)), this, SIGNAL(setCurrentNode(TreeNode*)));
-    disconnect(child, SIGNAL(expandCurrentNode(TreeNode*)),
-               this, SIGNAL(expandCurrentNode(TreeNode*)));
+    for (const QMetaMethod &signal : notificationSignals())
+        disconnect(child, signal, this, signal);
 }
 
 int TreeNode::row() const
@@ -323,7 +436,7 @@ int TreeNode::row() const
         return -1;
     const QList<TreeNode *> &siblings = _parentNode->_childNodes;
     const int size = siblings.size();
-    const int hint = rowHints.value(this, -1);
+    const int hint = rowHints.value(this);
     if (hint >= 0 && hint < size && siblings.at(hint) == this)
         return hint;
 

@@ -225,6 +225,26 @@ void TreeNodeTest::rowFollowsInsertionsAndRemovals()
     QVERIFY(!root->contains(nodes.at(40)));
     QVERIFY(!root->removeOne(nodes.at(40)));
     QCOMPARE(root->indexOf(nodes.at(41)), nodes.at(41)->row());
+
+    // Many nodes coming and going, hints remembered and forgotten in between:
+    // every row must still be exact.
+    std::unique_ptr<TestTreeNode> big(TreeString::makeTree(QString()));
+    QList<TreeNode *> many;
+    for (int i = 0; i < 3000; ++i)
+        many.append(new TestTreeNode(QString::number(i)));
+    big->append(many);
+    for (int i = 0; i < many.size(); i += 3)
+        delete many.at(i);
+    for (int i = 0; i < 200; ++i)
+        big->insert(i * 7, new TestTreeNode(QStringLiteral("x%1").arg(i), big.get()));
+    for (int i = big->childNodesCount() - 1; i >= 0; i -= 5)
+        QCOMPARE(big->childNodes().at(i)->row(), i);
+    for (int i = 0; i < big->childNodesCount(); ++i)
+        QCOMPARE(big->childNodes().at(i)->row(), i);
+    for (int i = 0; i < many.size(); ++i) {
+        if (i % 3)
+            delete many.at(i);
+    }
 }
 
 void TreeNodeTest::clearDeleteVariants()
