@@ -12,6 +12,14 @@ if(NOT TEST kvt_wipe_test_home)
     set_tests_properties(kvt_wipe_test_home PROPERTIES FIXTURES_SETUP kvt_test_home)
 endif()
 
+set(KVT_SANITIZER_ENV "")
+if(KVT_SANITIZE)
+    set(KVT_SANITIZER_ENV
+        "ASAN_OPTIONS=halt_on_error=1:abort_on_error=1:detect_leaks=1"
+        "UBSAN_OPTIONS=halt_on_error=1:print_stacktrace=1"
+        "LSAN_OPTIONS=suppressions=${PROJECT_SOURCE_DIR}/tests/lsan.supp:print_suppressions=0")
+endif()
+
 function(kvt_add_test name)
     cmake_parse_arguments(ARG "" "" "SOURCES;LIBS;ENV" ${ARGN})
     add_executable(${name} ${ARG_SOURCES})
@@ -21,5 +29,5 @@ function(kvt_add_test name)
     set_tests_properties(${name} PROPERTIES
         FIXTURES_REQUIRED kvt_test_home
         TIMEOUT 300
-        ENVIRONMENT "QT_QPA_PLATFORM=offscreen;HOME=${home};XDG_CONFIG_HOME=${home}/config;XDG_DATA_HOME=${home}/data;XDG_CACHE_HOME=${home}/cache;LC_ALL=C.UTF-8;LANG=C.UTF-8;KVT_TEST_HOME=${home};${ARG_ENV}")
+        ENVIRONMENT "QT_QPA_PLATFORM=offscreen;HOME=${home};XDG_CONFIG_HOME=${home}/config;XDG_DATA_HOME=${home}/data;XDG_CACHE_HOME=${home}/cache;LC_ALL=C.UTF-8;LANG=C.UTF-8;KVT_TEST_HOME=${home};${KVT_SANITIZER_ENV};${ARG_ENV}")
 endfunction()
