@@ -12,4 +12,15 @@
         <translation>Значение</translation>
     </message>
 </context>
+<context>
+    <name>QObject</name>
+    <message>
+        <source>started</source>
+        <translation>запущен</translation>
+    </message>
+    <message>
+        <source>stopped</source>
+        <translation>остановлен</translation>
+    </message>
+</context>
 </TS>

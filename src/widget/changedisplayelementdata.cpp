@@ -1,0 +1,18 @@
+#include "changedisplayelementdata.h"
+
+ChangeDisplayElementData::ChangeDisplayElementData()
+    : ChangeDisplayElementData(0)
+{
+}
+
+ChangeDisplayElementData::ChangeDisplayElementData(int displayType)
+    : _displayType(displayType)
+{
+}
+
+ChangeDisplayElementData::ChangeDisplayElementData(const ChangeDisplayElementData &other) = default;
+
+ChangeDisplayElementData &
+ChangeDisplayElementData::operator=(const ChangeDisplayElementData &other) = default;
+
+ChangeDisplayElementData::~ChangeDisplayElementData() = default;
