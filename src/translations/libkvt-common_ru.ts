@@ -12,4 +12,15 @@
         <translation>Значение</translation>
     </message>
 </context>
+<context>
+    <name>Process</name>
+    <message>
+        <source>Process &apos;%1&apos; not finished</source>
+        <translation>Процесс &apos;%1&apos; не завершён</translation>
+    </message>
+    <message>
+        <source>Process &apos;%1&apos; execute with error code &apos;%2&apos;</source>
+        <translation>Процесс &apos;%1&apos; завершился с кодом ошибки &apos;%2&apos;</translation>
+    </message>
+</context>
 </TS>
