@@ -1,0 +1,75 @@
+#ifndef KVT_REGEXPHANDLER_H
+#define KVT_REGEXPHANDLER_H
+
+#include "kvtcommon_export.h"
+
+#include <QByteArray>
+#include <QRegExp>
+#include <QString>
+
+/*!
+ * Reads and rewrites a line-oriented configuration file ("key = value" lines
+ * with "#" comments) under one regular expression.
+ *
+ * A subclass gives the expression and handles the lines that match it. A line
+ * is a candidate when the text before its first "#", trimmed, is not empty;
+ * the expression is searched in that text, and its captures are what
+ * handleRegExp() reads through regExp(). Every other line is copied byte for
+ * byte.
+ *
+ * A rewrite goes through a work copy "<file>.tmp" beside the file, can keep a
+ * backup "<file>.bak", and copies the result back with the system cp, which
+ * rewrites the file in place and so keeps its inode, mode and owner. Nothing
+ * is thrown: the operations return false and append a message to the
+ * caller's error text ("\n" first when the text is not empty). A failure
+ * leaves the files as they were at that point; there is no rollback.
+ *
+ * Two rewrites of the same file at the same time would share the work copy;
+ * callers keep them apart.
+ */
+class KVTCOMMON_EXPORT RegExpHandler
+{
+public:
+    explicit RegExpHandler(const QString &pattern);
+    virtual ~RegExpHandler();
+
+    /*!
+     * Called for every matching line. In a rewrite \a line holds the raw bytes
+     * of the line, terminator included. Return true after replacing it by bare
+     * content without a terminator: the line's comment and a "\n" are then
+     * added. Return false to have \a line written exactly as it stands
+     * (unchanged keeps the line, emptied deletes it). In a read \a line is
+     * null and the result is ignored.
+     */
+    virtual bool handleRegExp(QByteArray *line) = 0;
+
+    /*!
+     * Called once at the end of a rewrite with an empty \a tail. Return true
+     * to have \a tail written at the end of the file as it stands (line
+     * terminators included). The default appends nothing.
+     */
+    virtual bool finalHandleRegExp(QByteArray *tail);
+
+    /*!
+     * The expression, holding the captures of the last match. It is consulted
+     * afresh for every line, so a subclass may change it between lines.
+     */
+    QRegExp &regExp() { return _regExp; }
+    const QRegExp &regExp() const { return _regExp; }
+
+    static bool readSystemConfigureFile(const QString &fileName, RegExpHandler &handler, QString &error);
+    static bool rewriteSystemConfigureFile(const QString &fileName, RegExpHandler &handler, QString &error,
+                                           bool backup);
+
+    /*!
+     * Copies \a source over \a destination with
+     * "cp --force --preserve=mode,ownership", waiting up to 30 seconds for the
+     * start and again for the end.
+     */
+    static bool safeCopy(const QString &source, const QString &destination, QString &error);
+
+private:
+    QRegExp _regExp;
+};
+
+#endif
