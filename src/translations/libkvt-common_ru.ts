@@ -12,4 +12,11 @@
         <translation>Значение</translation>
     </message>
 </context>
+<context>
+    <name>MiscModel</name>
+    <message>
+        <source>Data</source>
+        <translation>Данные</translation>
+    </message>
+</context>
 </TS>
