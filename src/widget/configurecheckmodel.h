@@ -1,0 +1,49 @@
+#ifndef KVT_CONFIGURECHECKMODEL_H
+#define KVT_CONFIGURECHECKMODEL_H
+
+#include "checkmiscmodel.h"
+
+#include <QStringList>
+
+/*!
+ * A CheckMiscModel of modes with a description each (Qt::UserRole) and pairs
+ * of modes that exclude each other.
+ *
+ * While a row is ticked, every row incompatible with it is disabled and shows
+ * no check box. A pair of rows a < b is stored in inCmpatibleModes() as the
+ * key a * n + b, where n is the number of rows of the loaded list; callers
+ * fill the set the same way.
+ */
+class KVTCOMMON_EXPORT ConfigureCheckModel : public CheckMiscModel
+{
+    Q_OBJECT
+
+public:
+    explicit ConfigureCheckModel(QObject *parent = nullptr);
+    ~ConfigureCheckModel() override;
+
+    QVariant data(const QModelIndex &index, int role = Qt::DisplayRole) const override;
+    Qt::ItemFlags flags(const QModelIndex &index) const override;
+    bool setData(const QModelIndex &index, const QVariant &value, int role = Qt::EditRole) override;
+    using CheckMiscModel::data;
+    using CheckMiscModel::setData;
+
+    // The name is spelled so on purpose: callers know it by this name.
+    QSet<int> inCmpatibleModes() const { return _inCmpatibleModes; }
+    void setInCmpatibleModes(const QSet<int> &modes);
+    QStringList descriptions() const { return _descriptions; }
+    void setDescriptions(const QStringList &descriptions);
+
+    //! Whether rows \a a and \a b may be ticked together; false for a row
+    //! outside the list.
+    bool checkCompatible(int a, int b) const;
+
+protected:
+    //! Whether some ticked row excludes \a row.
+    bool isExcluded(int row) const;
+
+    QSet<int> _inCmpatibleModes;
+    QStringList _descriptions;
+};
+
+#endif // KVT_CONFIGURECHECKMODEL_H

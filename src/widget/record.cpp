@@ -1,0 +1,8 @@
+#include "record.h"
+
+Record::Record()
+    : _changed(false)
+{
+}
+
+Record::~Record() = default;

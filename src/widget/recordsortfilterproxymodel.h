@@ -1,0 +1,26 @@
+#ifndef KVT_RECORDSORTFILTERPROXYMODEL_H
+#define KVT_RECORDSORTFILTERPROXYMODEL_H
+
+#include "kvtcommon_export.h"
+
+#include <QSortFilterProxyModel>
+
+/*!
+ * Filters a record table by the proxy's filter regular expression
+ * (filterRegExp()): a row is shown when the expression is found in the
+ * display text of any of its columns. The filter key column plays no part.
+ * An empty or invalid expression shows every row.
+ */
+class KVTCOMMON_EXPORT RecordSortFilterProxyModel : public QSortFilterProxyModel
+{
+    Q_OBJECT
+
+public:
+    explicit RecordSortFilterProxyModel(QObject *parent = nullptr);
+    ~RecordSortFilterProxyModel() override;
+
+protected:
+    bool filterAcceptsRow(int sourceRow, const QModelIndex &sourceParent) const override;
+};
+
+#endif // KVT_RECORDSORTFILTERPROXYMODEL_H
