@@ -1,4 +1,8 @@
-# kvt_add_test(<name> SOURCES <file>... [LIBS <target>...] [ENV <VAR=value>...])
+# kvt_add_test(<name> SOURCES <file>... [LIBS <target>...] [ENV <VAR=value>...]
+#              [FUNCTIONS <test function>...])
+#
+# With FUNCTIONS, each listed test function runs in a process of its own
+# (test <name>_<function>), for state that lives as long as the process.
 #
 # Builds a QtTest executable and registers it with CTest. Every test runs on
 # the offscreen platform with a home, settings and data folder of its own under
@@ -21,13 +25,24 @@ if(KVT_SANITIZE)
 endif()
 
 function(kvt_add_test name)
-    cmake_parse_arguments(ARG "" "" "SOURCES;LIBS;ENV" ${ARGN})
+    cmake_parse_arguments(ARG "" "" "SOURCES;LIBS;ENV;FUNCTIONS" ${ARGN})
     add_executable(${name} ${ARG_SOURCES})
     target_link_libraries(${name} PRIVATE KvtCommon::KvtCommon kvttestsupport Qt5::Test ${ARG_LIBS})
-    set(home "${KVT_TEST_HOME_ROOT}/${name}")
-    add_test(NAME ${name} COMMAND ${name})
-    set_tests_properties(${name} PROPERTIES
+    set(tests)
+    if(ARG_FUNCTIONS)
+        foreach(fn IN LISTS ARG_FUNCTIONS)
+            add_test(NAME ${name}_${fn} COMMAND ${name} ${fn})
+            list(APPEND tests ${name}_${fn})
+        endforeach()
+    else()
+        add_test(NAME ${name} COMMAND ${name})
+        set(tests ${name})
+    endif()
+    foreach(test IN LISTS tests)
+        set(home "${KVT_TEST_HOME_ROOT}/${test}")
+        set_tests_properties(${test} PROPERTIES
         FIXTURES_REQUIRED kvt_test_home
         TIMEOUT 300
         ENVIRONMENT "QT_QPA_PLATFORM=offscreen;HOME=${home};XDG_CONFIG_HOME=${home}/config;XDG_DATA_HOME=${home}/data;XDG_CACHE_HOME=${home}/cache;LC_ALL=C.UTF-8;LANG=C.UTF-8;KVT_TEST_HOME=${home};${KVT_SANITIZER_ENV};${ARG_ENV}")
+    endforeach()
 endfunction()

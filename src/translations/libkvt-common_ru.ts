@@ -23,11 +23,11 @@
     <name>Process</name>
     <message>
         <source>Process &apos;%1&apos; not finished</source>
-        <translation>Процесс '%1' не завершён</translation>
+        <translation>Процесс &apos;%1&apos; не завершён</translation>
     </message>
     <message>
         <source>Process &apos;%1&apos; execute with error code &apos;%2&apos;</source>
-        <translation>Процесс '%1' завершился с кодом ошибки '%2'</translation>
+        <translation>Процесс &apos;%1&apos; завершился с кодом ошибки &apos;%2&apos;</translation>
     </message>
 </context>
 <context>
@@ -42,31 +42,104 @@
     </message>
     <message>
         <source>&quot;%1&quot; not exists</source>
-        <translation>"%1" не существует</translation>
+        <translation>&quot;%1&quot; не существует</translation>
     </message>
     <message>
         <source>&quot;%1&quot; error %2
 %3</source>
-        <translation>"%1" ошибка %2
+        <translation>&quot;%1&quot; ошибка %2
 %3</translation>
     </message>
     <message>
         <source>Process: &quot;%1 %2&quot;. Error: %3.
 &quot;Not started&quot;</source>
-        <translation>Процесс: "%1 %2". Ошибка: %3.
-"Не запущен"</translation>
+        <translation>Процесс: &quot;%1 %2&quot;. Ошибка: %3.
+&quot;Не запущен&quot;</translation>
     </message>
     <message>
         <source>Process: &quot;%1 %2&quot;. Error: %3.
 &quot;Not finished&quot;</source>
-        <translation>Процесс: "%1 %2". Ошибка: %3.
-"Не завершён"</translation>
+        <translation>Процесс: &quot;%1 %2&quot;. Ошибка: %3.
+&quot;Не завершён&quot;</translation>
     </message>
     <message>
         <source>Process: &quot;%1 %2&quot;. Exit code: %3.
 &quot;%4&quot;</source>
-        <translation>Процесс: "%1 %2". Код завершения: %3.
-"%4"</translation>
+        <translation>Процесс: &quot;%1 %2&quot;. Код завершения: %3.
+&quot;%4&quot;</translation>
+    </message>
+</context>
+<context>
+    <name>TaskObserver</name>
+    <message>
+        <source>The task was not started: no worker thread is free.</source>
+        <translation>Задача не запущена: нет свободного рабочего потока.</translation>
+    </message>
+</context>
+<context>
+    <name>TaskObserverDialog</name>
+    <message>
+        <source>Tasks</source>
+        <translation>Задачи</translation>
+    </message>
+    <message>
+        <source>More</source>
+        <translation>Подробнее</translation>
+    </message>
+    <message>
+        <source>Stop task</source>
+        <translation>Остановить задачу</translation>
+    </message>
+    <message>
+        <source>Stop</source>
+        <translation>Остановить</translation>
+    </message>
+    <message>
+        <source>Error</source>
+        <translation>Ошибка</translation>
+    </message>
+    <message>
+        <source>Warning</source>
+        <translation>Предупреждение</translation>
+    </message>
+    <message>
+        <source>%1: %2</source>
+        <translation>%1: %2</translation>
+    </message>
+</context>
+<context>
+    <name>TaskObserverModel</name>
+    <message>
+        <source>Task</source>
+        <translation>Задача</translation>
+    </message>
+    <message>
+        <source>Status</source>
+        <translation>Состояние</translation>
+    </message>
+    <message>
+        <source>Message</source>
+        <translation>Сообщение</translation>
+    </message>
+    <message>
+        <source>processing</source>
+        <translation>выполняется</translation>
+    </message>
+    <message>
+        <source>fail</source>
+        <translation>ошибка</translation>
+    </message>
+    <message>
+        <source>success</source>
+        <translation>успешно</translation>
+    </message>
+    <message>
+        <source>warning</source>
+        <translation>предупреждение</translation>
+    </message>
+    <message>
+        <source>about to be stop</source>
+        <translation>останавливается</translation>
     </message>
 </context>
 </TS>

@@ -1,6 +1,7 @@
 #include "treenode.h"
 
 #include <QMetaMethod>
+#include <QSet>
 #include <QVector>
 #include <QtAlgorithms>
 
@@ -151,9 +152,12 @@ void TreeNode::insert(int position, const QList<TreeNode *> &nodes)
 {
     QList<TreeNode *> incoming;
     incoming.reserve(nodes.size());
+    QSet<TreeNode *> seen;
     for (TreeNode *node : nodes) {
-        if (node && node != this && !incoming.contains(node))
+        if (node && node != this && !seen.contains(node)) {
+            seen.insert(node);
             incoming.append(node);
+        }
     }
     if (incoming.isEmpty())
         return;

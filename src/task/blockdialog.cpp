@@ -1,0 +1,8 @@
+#include "blockdialog.h"
+
+BlockDialog::BlockDialog(QWidget *parent)
+    : QDialog(parent)
+{
+    setModal(true);
+    setAttribute(Qt::WA_DeleteOnClose);
+}

@@ -1,0 +1,18 @@
+#include "startevent.h"
+#include "taskperformedevent.h"
+
+StartEvent::StartEvent(const QString &pluginPath)
+    : QEvent(EventType)
+    , _pluginPath(pluginPath)
+{
+}
+
+StartEvent::~StartEvent() = default;
+
+TaskPerformedEvent::TaskPerformedEvent(AbstractTask *task)
+    : QEvent(EventType)
+    , _task(task)
+{
+}
+
+TaskPerformedEvent::~TaskPerformedEvent() = default;

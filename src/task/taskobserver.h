@@ -1,0 +1,101 @@
+#ifndef KVT_TASKOBSERVER_H
+#define KVT_TASKOBSERVER_H
+
+#include "taskdescription.h"
+
+#include <QList>
+#include <QMap>
+#include <QObject>
+
+class AbstractTask;
+class BlockDialog;
+class QTimer;
+class TaskObserverDialog;
+class TaskObserverModel;
+class TaskPerformedEvent;
+
+/*!
+ * The one entry point through which tasks are started, and the list of the
+ * tasks started since the list was last cleared.
+ *
+ * performTask() records a task and hands it to the worker threads; when the
+ * task has run, the observer copies its outcome into the list, calls its
+ * afterRun() and deletes it, always in the interface thread.
+ *
+ * While work runs the task dialog cannot be closed. During the first second
+ * a small modal dialog blocks the window; after that the task dialog shows
+ * the list. When the last task ends without problems the dialog closes and
+ * the list is cleared; a failure or warning leaves it open for the user.
+ */
+class KVTCOMMON_EXPORT TaskObserver : public QObject
+{
+    Q_OBJECT
+
+public:
+    //! One entry of the list: what the task reported last, and the task
+    //! itself while it exists.
+    struct Row
+    {
+        TaskDescription description;
+        AbstractTask *task = nullptr;
+    };
+
+    static const int _delay = 1000;
+
+    /*!
+     * The observer of the process, created by the first call with \a parent
+     * as its QObject parent (and, when it is a widget, as the parent of the
+     * dialogs); later calls ignore \a parent.
+     */
+    static TaskObserver *instance(QObject *parent = nullptr);
+
+    ~TaskObserver() override;
+
+    /*! Starts \a task; the observer takes ownership. A null task, one that
+     *  is already listed and one already asked to stop are ignored. */
+    void performTask(AbstractTask *task);
+    TaskObserverModel *model() const { return _model; }
+    void taskPerformedEvent(TaskPerformedEvent *event);
+
+    bool event(QEvent *event) override;
+
+    const QList<Row> &rows() const { return _rows; }
+    int runningCount() const { return _runningCount; }
+    int problemCount() const { return _problemCount; }
+    TaskObserverDialog *dialog() const { return _dialog; }
+
+public Q_SLOTS:
+    void openTaskObserveDialog();
+    void clearTasks();
+
+Q_SIGNALS:
+    void tasksAboutToBeInserted(int first, int last);
+    void tasksAboutToBeRemoved(int first, int last);
+    void tasksInserted(int first, int last);
+    void tasksRemoved(int first, int last);
+    void taskDataChanged(int row);
+
+private:
+    explicit TaskObserver(QObject *parent);
+
+    void openBlockDialog();
+    void closeBlockDialog();
+    void recordOutcome(AbstractTask *task);
+    void forgetTask(AbstractTask *task);
+    bool requestStop(int row);
+
+    friend class TaskObserverModel;
+
+    int _runningCount;
+    int _problemCount;
+    QMap<AbstractTask *, int> _taskRows;
+    QList<Row> _rows;
+    QTimer *_timer;
+    TaskObserverModel *_model;
+    BlockDialog *_blockDialog;
+    TaskObserverDialog *_dialog;
+
+    static TaskObserver *_instance;
+};
+
+#endif // KVT_TASKOBSERVER_H

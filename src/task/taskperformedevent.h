@@ -1,0 +1,28 @@
+#ifndef KVT_TASKPERFORMEDEVENT_H
+#define KVT_TASKPERFORMEDEVENT_H
+
+#include "kvtcommon_export.h"
+
+#include <QEvent>
+
+class AbstractTask;
+
+/*!
+ * Posted by a task at the end of its run() (event type 1002); the task
+ * observer receives it in the interface thread. Does not own the task.
+ */
+class KVTCOMMON_EXPORT TaskPerformedEvent : public QEvent
+{
+public:
+    static const QEvent::Type EventType = QEvent::Type(1002);
+
+    explicit TaskPerformedEvent(AbstractTask *task);
+    ~TaskPerformedEvent() override;
+
+    AbstractTask *task() const { return _task; }
+
+private:
+    AbstractTask *_task;
+};
+
+#endif // KVT_TASKPERFORMEDEVENT_H
