@@ -259,11 +259,13 @@ void TreeNodeModel::connectVertexNode(TreeNode *node)
 
     // A root or extra node destroyed while shown must not leave the model
     // pointing at it: the model then forgets the node in one reset.
-    connect(node, &QObject::destroyed, this, [this](QObject *object) {
+    // By then the object is only a QObject: the pointer captured here is
+    // compared, never cast back to it.
+    connect(node, &QObject::destroyed, this, [this, node] {
         beginResetModel();
-        if (object == _rootNode)
+        if (node == _rootNode)
             _rootNode = nullptr;
-        _extraRootChildNodes.removeAll(static_cast<TreeNode *>(object));
+        _extraRootChildNodes.removeAll(node);
         endResetModel();
     });
 }

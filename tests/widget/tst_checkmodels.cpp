@@ -405,5 +405,5 @@ void CheckModelsTest::descriptionsAndSettings()
     QCOMPARE(model.inCmpatibleModes(), QSet<int>{1});
 }
 
-QTEST_MAIN(CheckModelsTest)
+QTEST_GUILESS_MAIN(CheckModelsTest)
 #include "tst_checkmodels.moc"
