@@ -5,8 +5,8 @@
 
 namespace {
 
-// Hides the nodes whose special flags have bit 1, like every choice view;
-// the row test below does not ask for it, though.
+// Every choice view is built with the filter that hides nodes marked with
+// bit 1; this class's own row test looks at the ticked state only.
 const int hiddenNodesFilter = 1;
 
 } // namespace

@@ -29,7 +29,9 @@ bool RecordModel::isCell(const QModelIndex &index) const
 // record twice, none of those in \a held.
 QList<Record *> RecordModel::newRecords(const QList<Record *> &records, const QList<Record *> &held) const
 {
-    QSet<Record *> seen(held.cbegin(), held.cend());
+    QSet<Record *> seen;
+    for (Record *record : held)
+        seen.insert(record);
     QList<Record *> result;
     result.reserve(records.size());
     for (Record *record : records) {
@@ -56,7 +58,9 @@ void RecordModel::setRecordList(const QList<Record *> &records)
     const QList<Record *> taken = newRecords(records, {});
     // A record given again (say, the model's own list with some additions)
     // stays alive; only the ones that leave the model are deleted.
-    const QSet<Record *> kept(taken.cbegin(), taken.cend());
+    QSet<Record *> kept;
+    for (Record *record : taken)
+        kept.insert(record);
     beginResetModel();
     const QList<Record *> old = _records;
     _records = taken;

@@ -435,5 +435,5 @@ void ChoiceTreeNodeProxyModelTest::withoutTreeSource()
     QCOMPARE(all.rowCount(), 2);
 }
 
-QTEST_MAIN(ChoiceTreeNodeProxyModelTest)
+QTEST_GUILESS_MAIN(ChoiceTreeNodeProxyModelTest)
 #include "tst_choicetreenodeproxymodel.moc"

@@ -313,5 +313,5 @@ void TreeNodeModelTest::rootDataChangeUsesInvalidIndexes()
     QCOMPARE(log->take(), QStringList{"changed(root, root)"});
 }
 
-QTEST_MAIN(TreeNodeModelTest)
+QTEST_GUILESS_MAIN(TreeNodeModelTest)
 #include "tst_treenodemodel.moc"

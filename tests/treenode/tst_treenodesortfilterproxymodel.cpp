@@ -306,5 +306,5 @@ void TreeNodeSortFilterProxyModelTest::sourceThatIsNoTreeModel()
     keep.clear(); // before the items go
 }
 
-QTEST_MAIN(TreeNodeSortFilterProxyModelTest)
+QTEST_GUILESS_MAIN(TreeNodeSortFilterProxyModelTest)
 #include "tst_treenodesortfilterproxymodel.moc"

@@ -518,5 +518,5 @@ void RecordsTest::filterEdgeCases()
     QCOMPARE(rows(*model), QStringLiteral("ba b _ c bc"));
 }
 
-QTEST_MAIN(RecordsTest)
+QTEST_GUILESS_MAIN(RecordsTest)
 #include "tst_records.moc"
