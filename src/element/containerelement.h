@@ -1,0 +1,31 @@
+#ifndef KVT_CONTAINERELEMENT_H
+#define KVT_CONTAINERELEMENT_H
+
+#include "element.h"
+
+/*!
+ * An element whose children are read from the system when it is first
+ * expanded (canFetchMore()/fetchMore() with ReadContentOperation), and under
+ * which new elements are created. It can switch how its children are shown
+ * with a ChangeDisplayElementData given to ChangeDisplayOperation; the
+ * module is not told of that switch.
+ *
+ * Offers ReadContentOperation, and CreateOperation too when editable.
+ * Forwards ReadContentOperation and CreateOperation to the module.
+ */
+class KVTCOMMON_EXPORT ContainerElement : public Element
+{
+    Q_OBJECT
+
+public:
+    ContainerElement(Module &module, RightsPredicate rights);
+    ~ContainerElement() override;
+
+    quint64 availableOperations() const override;
+    void performOperation(OperationType type, ElementData *data, int flags) override;
+
+    /*! Marks the children to be read again at the next expansion. */
+    void resetRequireLoad();
+};
+
+#endif // KVT_CONTAINERELEMENT_H

@@ -1,0 +1,29 @@
+#ifndef KVT_SERVICEELEMENT_H
+#define KVT_SERVICEELEMENT_H
+
+#include "element.h"
+
+/*!
+ * An element that stands for a system service. Its data is a
+ * ServiceLightElementData; once the service state is known (a non-empty
+ * state text) the element shows the theme's start or stop icon.
+ *
+ * It offers no operations of its own: service plugins decide them.
+ */
+class KVTCOMMON_EXPORT ServiceElement : public Element
+{
+    Q_OBJECT
+
+public:
+    ServiceElement(Module &module, RightsPredicate rights);
+    ~ServiceElement() override;
+
+    QVariant data(int column, int role) const override;
+
+    /*! "media-playback-start" of the icon theme; null without one. */
+    static QIcon startIcon();
+    /*! "media-playback-stop" of the icon theme; null without one. */
+    static QIcon stopIcon();
+};
+
+#endif // KVT_SERVICEELEMENT_H

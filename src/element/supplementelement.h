@@ -1,0 +1,24 @@
+#ifndef KVT_SUPPLEMENTELEMENT_H
+#define KVT_SUPPLEMENTELEMENT_H
+
+#include "element.h"
+
+/*!
+ * An element that adds properties to another element: it is only read and
+ * updated, and marks itself with the special flag 1 so that filters can
+ * leave it out of plain element lists.
+ */
+class KVTCOMMON_EXPORT SupplementElement : public Element
+{
+    Q_OBJECT
+
+public:
+    SupplementElement(Module &module, RightsPredicate rights);
+    ~SupplementElement() override;
+
+    int treeNodeSpecialFlags() const override;
+    quint64 availableOperations() const override;
+    void performOperation(OperationType type, ElementData *data, int flags) override;
+};
+
+#endif // KVT_SUPPLEMENTELEMENT_H

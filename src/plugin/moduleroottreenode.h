@@ -1,0 +1,23 @@
+#ifndef KVT_MODULEROOTTREENODE_H
+#define KVT_MODULEROOTTREENODE_H
+
+#include "treenode.h"
+
+/*!
+ * The invisible root of the module tree, with the columns "Name", "Reread"
+ * and "Description". Its expected depth is 0 and its id empty, so modules of
+ * expected depth 1 without an expected parent hang directly below it.
+ */
+class KVTCOMMON_EXPORT ModuleRootTreeNode : public TreeNode
+{
+    Q_OBJECT
+
+public:
+    explicit ModuleRootTreeNode(QObject *parent = nullptr);
+    ~ModuleRootTreeNode() override;
+
+    int columnCount() const override;
+    QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
+};
+
+#endif // KVT_MODULEROOTTREENODE_H
