@@ -13,10 +13,46 @@
     </message>
 </context>
 <context>
+    <name>Element</name>
+    <message>
+        <source>Do you really want to remove this element?</source>
+        <translation>Вы действительно хотите удалить этот элемент?</translation>
+    </message>
+</context>
+<context>
+    <name>ElementRootTreeNode</name>
+    <message>
+        <source>Name</source>
+        <translation>Имя</translation>
+    </message>
+</context>
+<context>
     <name>MiscModel</name>
     <message>
         <source>Data</source>
         <translation>Данные</translation>
+    </message>
+</context>
+<context>
+    <name>Module</name>
+    <message>
+        <source>Force reread mode</source>
+        <translation>Режим принудительного перечитывания</translation>
+    </message>
+</context>
+<context>
+    <name>ModuleRootTreeNode</name>
+    <message>
+        <source>Name</source>
+        <translation>Имя</translation>
+    </message>
+    <message>
+        <source>Reread</source>
+        <translation>Перечитывать</translation>
+    </message>
+    <message>
+        <source>Description</source>
+        <translation>Описание</translation>
     </message>
 </context>
 <context>
