@@ -14,6 +14,32 @@ namespace {
 
 const char geometryKey[] = "taskObserverDialog/taskObserverDialogGeometry";
 
+// Columns size themselves to their contents, which costs a look at the rows
+// after every change of the list. A closed dialog skips that: the sizing is
+// switched on while the dialog is shown and off while it is hidden, so a long
+// run of tasks costs nothing in a window nobody sees.
+class ContentSizing : public QObject
+{
+public:
+    ContentSizing(QHeaderView *header, QObject *parent)
+        : QObject(parent)
+        , header(header)
+    {
+    }
+
+    bool eventFilter(QObject *, QEvent *event) override
+    {
+        if (event->type() == QEvent::Show)
+            header->setSectionResizeMode(QHeaderView::ResizeToContents);
+        else if (event->type() == QEvent::Hide)
+            header->setSectionResizeMode(QHeaderView::Interactive);
+        return false;
+    }
+
+private:
+    QHeaderView *header;
+};
+
 int statusOf(const QModelIndex &index)
 {
     return index.sibling(index.row(), 1).data(Qt::EditRole).toInt();
@@ -33,7 +59,8 @@ TaskObserverDialog::TaskObserverDialog(TaskObserver *observer, QWidget *parent)
 
     _ui->_taskTreeView->setModel(observer->model());
     _ui->_taskTreeView->header()->hideSection(2);
-    _ui->_taskTreeView->header()->setSectionResizeMode(QHeaderView::ResizeToContents);
+    QHeaderView *header = _ui->_taskTreeView->header();
+    installEventFilter(new ContentSizing(header, this));
 
     connect(_ui->_taskTreeView->selectionModel(), SIGNAL(selectionChanged(QItemSelection,QItemSelection)),
             this, SLOT(enableMoreButtonSelectChange(QItemSelection)));

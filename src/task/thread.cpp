@@ -36,6 +36,29 @@ bool Thread::put(AbstractTask *task)
     return true;
 }
 
+namespace {
+
+// Short tasks arrive one by one as the interface thread hands them out. A
+// worker that went to sleep at once would be woken for nearly every task,
+// and each wake-up takes the processor from the interface thread that is
+// feeding the ring. So a worker that finds the ring empty first yields a few
+// times, then blocks.
+const int yieldsBeforeBlocking = 50;
+
+} // namespace
+
+void Thread::takeFilledSlot()
+{
+    if (_fullBuffer.tryAcquire(1))
+        return;
+    for (int i = 0; i < yieldsBeforeBlocking; ++i) {
+        QThread::yieldCurrentThread();
+        if (_fullBuffer.tryAcquire(1))
+            return;
+    }
+    _fullBuffer.acquire(1);
+}
+
 void Thread::run()
 {
     {
@@ -51,7 +74,7 @@ void Thread::run()
     }
 
     for (;;) {
-        _fullBuffer.acquire(1);
+        takeFilledSlot();
         if (_stopThread.load())
             break;
         AbstractTask *task = nullptr;

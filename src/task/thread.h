@@ -45,6 +45,8 @@ protected:
     void run() override;
 
 private:
+    static void takeFilledSlot();
+
     int _threadIndex;
 
     static AbstractTask *_buffer[BufferSize];
