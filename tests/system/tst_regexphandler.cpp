@@ -206,6 +206,12 @@ void RegExpHandlerTest::rewriteContent_data()
         << QByteArray() << QStringList() << QStringList() << QByteArray("first = 1\n") << QByteArray("first = 1\n");
     QTest::newRow("empty file stays empty") << QByteArray() << QStringList() << QStringList() << QByteArray()
                                             << QByteArray();
+    QTest::newRow("comment after a NUL byte is not seen")
+        << QByteArray("key = old\0 # hidden\n", 20) << QStringList{"key=new"} << QStringList() << QByteArray()
+        << QByteArray("key = new\n");
+    QTest::newRow("non-ASCII value, comment put back")
+        << QByteArray("key = \xd0\xb4\xd0\xb0 # \xd0\xbd\xd0\xb5\xd1\x82\n") << QStringList{"key=new"} << QStringList()
+        << QByteArray() << QByteArray("key = new\t# \xd0\xbd\xd0\xb5\xd1\x82\n");
     QTest::newRow("non-UTF-8 comment survives a replacement")
         << QByteArray("key = old # caf\xe9\n") << QStringList{"key=new"} << QStringList() << QByteArray()
         << QByteArray("key = new\t# caf\xef\xbf\xbd\n");
@@ -262,13 +268,18 @@ void RegExpHandlerTest::rewriteWithoutOverrides()
 void RegExpHandlerTest::readCallsHandlerForEveryMatch()
 {
     const QString file = path(QStringLiteral("read.conf"));
-    const QByteArray content("a = 1\n#b = 2\n  c = 3 # x\nnot matching\n\n  # d = 4\ne=5\r\nf = \"6#7\"\ng = last");
+    // Unicode blanks around the text are trimmed like ASCII ones; the text
+    // ends at a NUL byte.
+    const QByteArray content("a = 1\n#b = 2\n  c = 3 # x\nnot matching\n\n  # d = 4\ne=5\r\nf = \"6#7\"\n"
+                             "\xc2\xa0h = 8\xc2\xa0# nbsp\n" "i\0 = 9\n" "\xe2\x80\x83j = 10\t\xe2\x80\x83\n"
+                             "k = 11\0# after nul\n" "g = last", 128);
     QVERIFY(writeAll(file, content));
     KeyValueHandler handler;
     handler.replace.insert(QStringLiteral("a"), "changed");
     QString error = QStringLiteral("earlier");
     QVERIFY(RegExpHandler::readSystemConfigureFile(file, handler, error));
-    QCOMPARE(handler.calls, (QStringList{"null:a=1", "null:c=3", "null:e=5", "null:f=\"6", "null:g=last"}));
+    QCOMPARE(handler.calls, (QStringList{"null:a=1", "null:c=3", "null:e=5", "null:f=\"6", "null:h=8", "null:j=10", "null:k=11",
+                                     "null:g=last"}));
     QCOMPARE(error, QStringLiteral("earlier"));
     // A read changes nothing on disk.
     QCOMPARE(readAll(file), content);
