@@ -1,5 +1,7 @@
 #include "regexphandler.h"
 
+#include "regexpprefilter_p.h"
+
 #include <QFile>
 #include <QObject>
 #include <QProcess>
@@ -122,11 +124,12 @@ bool localeKeepsAscii()
     }
 }
 
-// Line selection shared by both traversals. \a text receives what the
-// expression is searched in; false for a blank or pure comment line. No
-// quoting is understood: a '#' inside a quoted value starts the comment all
-// the same.
-bool candidateText(const char *data, int size, bool asciiShortcut, QString &text)
+// Line selection shared by both traversals: whether the line is a candidate
+// (the text before its first '#', trimmed, is not empty) and the handler's
+// expression is found in that text. No quoting is understood: a '#' inside a
+// quoted value starts the comment all the same.
+bool lineMatches(RegExpHandler &handler, RegExpPrefilter &prefilter, const char *data, int size,
+                 bool asciiShortcut)
 {
     // The decoded line stops at the first NUL byte.
     if (const void *nul = std::memchr(data, '\0', size_t(size)))
@@ -147,19 +150,17 @@ bool candidateText(const char *data, int size, bool asciiShortcut, QString &text
                 --last;
             if (first == last)
                 return false;
-            text = QString::fromLatin1(data + first, last - first);
-            return true;
+            if (prefilter.usable(handler.regExp()) && !prefilter.canMatch(data + first, last - first))
+                return false;
+            return handler.regExp().indexIn(QString::fromLatin1(data + first, last - first), 0) != -1;
         }
     }
 
     const QString decoded = QString::fromLocal8Bit(data, size);
     const int commentStart = decoded.indexOf(QLatin1Char('#'));
-    text = (commentStart < 0 ? decoded : decoded.left(commentStart)).trimmed();
-    return !text.isEmpty();
-}
-
-bool matches(RegExpHandler &handler, const QString &text)
-{
+    const QString text = (commentStart < 0 ? decoded : decoded.left(commentStart)).trimmed();
+    if (text.isEmpty())
+        return false;
     return handler.regExp().indexIn(text, 0) != -1;
 }
 
@@ -190,12 +191,12 @@ bool RegExpHandler::readSystemConfigureFile(const QString &fileName, RegExpHandl
         return false;
     }
     const bool asciiShortcut = localeKeepsAscii();
+    RegExpPrefilter prefilter;
     LineReader reader(file);
     const char *data = nullptr;
     int size = 0;
-    QString text;
     while (reader.next(data, size)) {
-        if (candidateText(data, size, asciiShortcut, text) && matches(handler, text))
+        if (lineMatches(handler, prefilter, data, size, asciiShortcut))
             handler.handleRegExp(nullptr);
     }
     file.close();
@@ -237,12 +238,12 @@ bool RegExpHandler::rewriteSystemConfigureFile(const QString &fileName, RegExpHa
         }
     };
     const bool asciiShortcut = localeKeepsAscii();
+    RegExpPrefilter prefilter;
     LineReader reader(target);
     const char *data = nullptr;
     int size = 0;
-    QString text;
     while (reader.next(data, size)) {
-        if (!candidateText(data, size, asciiShortcut, text) || !matches(handler, text)) {
+        if (!lineMatches(handler, prefilter, data, size, asciiShortcut)) {
             out.append(data, size);
             flush(outputBlockSize);
             continue;
