@@ -119,8 +119,10 @@ bool readSet(Reader &r, CharSet &set)
 
 } // namespace
 
+namespace {
+
 // Recursive-descent reader of the subset: any construct outside it fails.
-struct RegExpPrefilterParser
+struct SubsetParser
 {
     using Node = RegExpPrefilter::Node;
 
@@ -269,6 +271,8 @@ struct RegExpPrefilterParser
     }
 };
 
+} // namespace
+
 bool RegExpPrefilter::usable(const QRegExp &regExp)
 {
     const QString pattern = regExp.pattern();
@@ -287,7 +291,7 @@ bool RegExpPrefilter::build(const QString &pattern)
     _states.clear();
     Reader reader{pattern};
     Node root;
-    if (!RegExpPrefilterParser::alternation(reader, root) || !reader.atEnd())
+    if (!SubsetParser::alternation(reader, root) || !reader.atEnd())
         return false;
     State match;
     match.kind = State::Match;
