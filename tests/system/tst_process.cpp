@@ -38,7 +38,6 @@ class ProcessTest : public QObject
 private Q_SLOTS:
     void exceptionKeepsTextAndBytes();
     void exceptionWhatAcrossThreads();
-    void exceptionTravelsInVariant();
 
     void failures_data();
     void failures();
@@ -110,12 +109,6 @@ void ProcessTest::exceptionWhatAcrossThreads()
         futures << QtConcurrent::run(work, seed);
     for (QFuture<int> &f : futures)
         QCOMPARE(f.result(), 0);
-}
-
-void ProcessTest::exceptionTravelsInVariant()
-{
-    const QVariant v = QVariant::fromValue(AppException(QStringLiteral("queued")));
-    QCOMPARE(v.value<AppException>().getText(), QStringLiteral("queued"));
 }
 
 void ProcessTest::failures_data()

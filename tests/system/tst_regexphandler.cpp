@@ -4,6 +4,7 @@
 
 #include <QDir>
 #include <QFileInfo>
+#include <QRandomGenerator>
 #include <QRegularExpression>
 #include <QtTest>
 
@@ -111,6 +112,7 @@ private Q_SLOTS:
     void rewriteWithoutOverrides();
     void readCallsHandlerForEveryMatch();
     void handlerMayChangeExpressionBetweenLines();
+    void matchingAgreesWithQRegExp();
     void rewriteKeepsInodeModeAndOwner();
     void backupHandling();
     void oddFileNamesReachCpUnchanged();
@@ -206,6 +208,12 @@ void RegExpHandlerTest::rewriteContent_data()
         << QByteArray() << QStringList() << QStringList() << QByteArray("first = 1\n") << QByteArray("first = 1\n");
     QTest::newRow("empty file stays empty") << QByteArray() << QStringList() << QStringList() << QByteArray()
                                             << QByteArray();
+    QTest::newRow("comment after a NUL byte is not seen")
+        << QByteArray("key = old\0 # hidden\n", 20) << QStringList{"key=new"} << QStringList() << QByteArray()
+        << QByteArray("key = new\n");
+    QTest::newRow("non-ASCII value, comment put back")
+        << QByteArray("key = \xd0\xb4\xd0\xb0 # \xd0\xbd\xd0\xb5\xd1\x82\n") << QStringList{"key=new"} << QStringList()
+        << QByteArray() << QByteArray("key = new\t# \xd0\xbd\xd0\xb5\xd1\x82\n");
     QTest::newRow("non-UTF-8 comment survives a replacement")
         << QByteArray("key = old # caf\xe9\n") << QStringList{"key=new"} << QStringList() << QByteArray()
         << QByteArray("key = new\t# caf\xef\xbf\xbd\n");
@@ -262,13 +270,18 @@ void RegExpHandlerTest::rewriteWithoutOverrides()
 void RegExpHandlerTest::readCallsHandlerForEveryMatch()
 {
     const QString file = path(QStringLiteral("read.conf"));
-    const QByteArray content("a = 1\n#b = 2\n  c = 3 # x\nnot matching\n\n  # d = 4\ne=5\r\nf = \"6#7\"\ng = last");
+    // Unicode blanks around the text are trimmed like ASCII ones; the text
+    // ends at a NUL byte.
+    const QByteArray content("a = 1\n#b = 2\n  c = 3 # x\nnot matching\n\n  # d = 4\ne=5\r\nf = \"6#7\"\n"
+                             "\xc2\xa0h = 8\xc2\xa0# nbsp\n" "i\0 = 9\n" "\xe2\x80\x83j = 10\t\xe2\x80\x83\n"
+                             "k = 11\0# after nul\n" "g = last", 128);
     QVERIFY(writeAll(file, content));
     KeyValueHandler handler;
     handler.replace.insert(QStringLiteral("a"), "changed");
     QString error = QStringLiteral("earlier");
     QVERIFY(RegExpHandler::readSystemConfigureFile(file, handler, error));
-    QCOMPARE(handler.calls, (QStringList{"null:a=1", "null:c=3", "null:e=5", "null:f=\"6", "null:g=last"}));
+    QCOMPARE(handler.calls, (QStringList{"null:a=1", "null:c=3", "null:e=5", "null:f=\"6", "null:h=8", "null:j=10", "null:k=11",
+                                     "null:g=last"}));
     QCOMPARE(error, QStringLiteral("earlier"));
     // A read changes nothing on disk.
     QCOMPARE(readAll(file), content);
@@ -303,6 +316,97 @@ void RegExpHandlerTest::handlerMayChangeExpressionBetweenLines()
     QVERIFY(RegExpHandler::rewriteSystemConfigureFile(file, handler, error, false));
     QCOMPARE(handler.seen, (QStringList{"server", "8"}));
     QCOMPARE(readAll(file), QByteArray("port 7\n[server]\nport 1\n"));
+}
+
+namespace {
+
+// Records the whole match of every call.
+class MatchRecorder : public RegExpHandler
+{
+public:
+    explicit MatchRecorder(const QString &pattern)
+        : RegExpHandler(pattern)
+    {
+    }
+    bool handleRegExp(QByteArray *) override
+    {
+        matches << regExp().cap(0);
+        return false;
+    }
+    QStringList matches;
+};
+
+QString randomPattern(QRandomGenerator &random, int depth)
+{
+    static const char *const atoms[] = {"a", "b", "k", "e", "y", "=", "0", "1", " ", "-", "_", ".", "\\.",
+                                        "\\-", "\\=", "\\d", "\\D", "\\s", "\\S", "\\w", "\\W",
+                                        "[a-c]", "[^=]", "[0-9_]", "[.=]", "[^ ]", "[k-y0]", "^", "$",
+                                        // outside the common subset
+                                        "\\b", "[[:alpha:]]", "(?=a)", "\\x41"};
+    static const char *const quantifiers[] = {"", "", "", "*", "+", "?", "{2}", "{1,3}", "{0,}", "{2,}", "{,2}", "*?"};
+    QString pattern;
+    const int pieces = 1 + int(random.bounded(4));
+    for (int i = 0; i < pieces; ++i) {
+        if (depth < 2 && random.bounded(4) == 0) {
+            pattern += random.bounded(2) ? QStringLiteral("(") : QStringLiteral("(?:");
+            pattern += randomPattern(random, depth + 1);
+            if (random.bounded(2))
+                pattern += QLatin1Char('|') + randomPattern(random, depth + 1);
+            pattern += QLatin1Char(')');
+        } else {
+            pattern += QLatin1String(atoms[random.bounded(int(sizeof atoms / sizeof *atoms))]);
+        }
+        pattern += QLatin1String(quantifiers[random.bounded(int(sizeof quantifiers / sizeof *quantifiers))]);
+    }
+    if (depth == 0 && random.bounded(5) == 0)
+        pattern += QLatin1Char('|') + randomPattern(random, 1);
+    return pattern;
+}
+
+} // namespace
+
+void RegExpHandlerTest::matchingAgreesWithQRegExp()
+{
+    // Lines are selected quickly for common expressions; whatever the route,
+    // the handler must see exactly the lines (and matches) that QRegExp
+    // itself finds in the text before the comment.
+    QStringList patterns{"^(\\w+)\\s*=\\s*(.*)$", "^(key\\d*[02468]00)\\s*=", "a|^b", "$", "^$", "^", "x*",
+                         "(a|)+b", "((a)*)*b", ".{2,3}=", "[^=]+=[^=]*$", "a{0}b", "(?:ab){2,}", "e$|^k", "=\\s+$"};
+    QRandomGenerator random(20240611);
+    for (int i = 0; i < 400; ++i)
+        patterns << randomPattern(random, 0);
+
+    static const char alphabet[] = "abkey=019 -_.\tAB";
+    const QString file = path(QStringLiteral("agree.conf"));
+    for (const QString &pattern : qAsConst(patterns)) {
+        QByteArray content;
+        QStringList texts;
+        for (int line = 0; line < 60; ++line) {
+            QByteArray text;
+            const int length = int(random.bounded(13));
+            for (int k = 0; k < length; ++k)
+                text += alphabet[random.bounded(int(sizeof alphabet - 1))];
+            if (random.bounded(15) == 0)
+                text += "\xc3\xa9" + text; // some lines take the decoding route
+            if (random.bounded(6) == 0)
+                text += " # note";
+            content += text + '\n';
+            texts << QString::fromUtf8(text).section(QLatin1Char('#'), 0, 0).trimmed();
+        }
+        QVERIFY(writeAll(file, content));
+
+        QRegExp reference(pattern, Qt::CaseSensitive, QRegExp::RegExp);
+        QStringList expected;
+        for (const QString &text : qAsConst(texts)) {
+            if (!text.isEmpty() && reference.indexIn(text, 0) != -1)
+                expected << reference.cap(0);
+        }
+        MatchRecorder recorder(pattern);
+        QString error;
+        QVERIFY(RegExpHandler::readSystemConfigureFile(file, recorder, error));
+        QVERIFY2(recorder.matches == expected, qPrintable(QStringLiteral("pattern %1: %2 matches, %3 expected")
+                                                              .arg(pattern).arg(recorder.matches.size()).arg(expected.size())));
+    }
 }
 
 void RegExpHandlerTest::rewriteKeepsInodeModeAndOwner()

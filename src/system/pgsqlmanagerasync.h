@@ -1,0 +1,51 @@
+#ifndef KVT_PGSQLMANAGERASYNC_H
+#define KVT_PGSQLMANAGERASYNC_H
+
+#include "kvtcommon_export.h"
+
+#include "appexception.h"
+#include "pgsqlmanager.h"
+
+#include <QFutureWatcher>
+#include <QList>
+#include <QObject>
+
+class PgsqlCluster;
+
+/*!
+ * Reads the cluster list on the global thread pool and reports by signals.
+ *
+ * A read that fails emits exceptionArise() from the worker thread (receivers
+ * in other threads get it queued), then, like every read, clustersReaded()
+ * from this object's thread with the clusters parsed before the failure. The
+ * clusters belong to the object and are replaced by the next read.
+ *
+ * One read at a time: startReadClusters() while a read runs does nothing, and
+ * that read reports. Destruction waits for a running read to end.
+ */
+class KVTCOMMON_EXPORT PgsqlManagerAsync : public QObject
+{
+    Q_OBJECT
+
+public:
+    explicit PgsqlManagerAsync(QObject *parent = nullptr);
+    ~PgsqlManagerAsync() override;
+
+    void startReadClusters();
+    //! The body of a read, run on a pool thread.
+    void performReadClusters();
+
+Q_SIGNALS:
+    // The spelling of the name is kept: receivers connect to it by name.
+    void clustersReaded(const QList<PgsqlCluster *> &clusters);
+    void exceptionArise(const AppException &exception);
+
+private Q_SLOTS:
+    void readClustersFinished();
+
+private:
+    QFutureWatcher<void> _watcher;
+    PgsqlManager _manager;
+};
+
+#endif
