@@ -1,6 +1,7 @@
 #include "contextoperation.h"
 
 #include "element.h"
+#include "elementwidget.h"
 
 const QString ContextOperation::undefinedElementType = QStringLiteral("Undefined");
 const QString ContextOperation::allElementType = QStringLiteral("All");
@@ -32,4 +33,18 @@ bool ContextOperation::isEditable() const
 Element *ContextOperation::elementContext()
 {
     return dynamic_cast<Element *>(this);
+}
+
+ElementWidget *ContextOperation::elementWidgetContext()
+{
+    return dynamic_cast<ElementWidget *>(this);
+}
+
+QString ContextOperation::caption() const
+{
+    if (const auto *widget = dynamic_cast<const ElementWidget *>(this))
+        return widget->caption();
+    if (const auto *element = dynamic_cast<const Element *>(this))
+        return element->title();
+    return QString();
 }

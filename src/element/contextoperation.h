@@ -9,6 +9,7 @@
 
 class Element;
 class ElementData;
+class ElementWidget;
 class Module;
 
 /*!
@@ -56,6 +57,12 @@ public:
 
     /*! This object as an element, or null when it is not one. */
     Element *elementContext();
+    /*! This object as an element widget, or null when it is not one. */
+    ElementWidget *elementWidgetContext();
+
+    /*! The text that names this context above its widgets: an element's
+     *  title, or for an element widget its ElementWidget::caption(). */
+    QString caption() const;
 
 protected:
     Module &_module;

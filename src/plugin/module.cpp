@@ -3,6 +3,8 @@
 #include "containerelement.h"
 #include "element.h"
 #include "elementdata.h"
+#include "elementwidget.h"
+#include "vieweditelementwidget.h"
 #include "module_p.h"
 
 #include <QLoggingCategory>
@@ -122,11 +124,13 @@ Module::~Module()
 {
     ModulePrivate::markDying(this);
     saveSettings();
+    // The widgets go first: they still refer to the module and may read its
+    // data while they are destroyed.
+    const QList<ElementWidget *> widgets = _elementWidgets.values();
+    _elementWidgets.clear();
+    qDeleteAll(widgets);
     delete _moduleData;
     _moduleData = nullptr;
-    // The element widgets are deleted by their QObject parents for now:
-    // this module only keeps the pointers.
-    _elementWidgets.clear();
     _elementActionsMap.clear();
     _elementNodes.clear();
 }
@@ -262,6 +266,41 @@ QList<QAction *> Module::elementActions(const QString &type) const
 ElementWidget *Module::elementWidget(const QString &type) const
 {
     return _elementWidgets.value(type, nullptr);
+}
+
+void Module::insertElementWidget(ElementWidget *widget)
+{
+    if (!widget)
+        return;
+    const QString type = widget->elementType();
+    if (type == ContextOperation::undefinedElementType || _elementWidgets.contains(type)) {
+        delete widget;
+        return;
+    }
+    _elementWidgets.insert(type, widget);
+    // A widget deleted by someone else (its parent window) is forgotten, so
+    // the module never deletes it a second time.
+    connect(widget, &QObject::destroyed, this, [this, type, widget] {
+        const auto it = _elementWidgets.find(type);
+        if (it != _elementWidgets.end() && it.value() == widget)
+            _elementWidgets.erase(it);
+    });
+}
+
+void Module::connectElementWidgets()
+{
+    for (ElementWidget *widget : qAsConst(_elementWidgets)) {
+        if (qobject_cast<ViewEditElementWidget *>(widget)) {
+            connect(widget, SIGNAL(contentChanged( int )), this,
+                    SIGNAL(contentElementWidgetChanged( int )), Qt::UniqueConnection);
+        }
+        // Checked by class name: the list widgets are built on top of this
+        // library's core, which does not depend on them.
+        if (widget->inherits("ListElementWidget")) {
+            connect(widget, SIGNAL(customContextMenuRequested( QPoint )), this,
+                    SIGNAL(customContextMenuRequested( QPoint )), Qt::UniqueConnection);
+        }
+    }
 }
 
 void Module::resetConteinerElement()

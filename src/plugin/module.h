@@ -70,6 +70,20 @@ public:
     QList<QAction *> elementActions(const QString &type) const;
     ElementWidget *elementWidget(const QString &type) const;
 
+    /*!
+     * Keeps \a widget as the widget for its element type, and owns it from
+     * now on. A widget whose type is undefined, or whose type already has a
+     * widget, is deleted at once. A null widget is ignored.
+     */
+    void insertElementWidget(ElementWidget *widget);
+    /*!
+     * Relays the contentChanged() of every stored ViewEditElementWidget as
+     * contentElementWidgetChanged(), and the context menu requests of every
+     * stored list widget as customContextMenuRequested(). Calling it again
+     * adds no second connection.
+     */
+    void connectElementWidgets();
+
     /*! Clears every container element of the module, destroying its
      *  children, and marks it to be read again. (The name is kept as plugins
      *  know it.) */

@@ -178,4 +178,21 @@
         <translation>останавливается</translation>
     </message>
 </context>
+<context>
+    <name>ViewEditElementWidget</name>
+    <message>
+        <source>Element activation</source>
+        <translation>Активация элемента</translation>
+    </message>
+    <message>
+        <source>Changes not saved!
+Continue without saving?</source>
+        <translation>Изменения не сохранены!
+Продолжить без сохранения?</translation>
+    </message>
+    <message>
+        <source>Activation of this element not supported!</source>
+        <translation>Активация этого элемента не поддерживается!</translation>
+    </message>
+</context>
 </TS>
