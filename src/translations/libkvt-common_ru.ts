@@ -56,6 +56,25 @@
     </message>
 </context>
 <context>
+    <name>PgsqlCluster</name>
+    <message>
+        <source>Cluster info not valid &apos;%1&apos;</source>
+        <translation>Неверные сведения о кластере '%1'</translation>
+    </message>
+    <message>
+        <source>SQL request &apos;%1&apos; contains a character that cannot be passed to the shell</source>
+        <translation>SQL-запрос '%1' содержит символ, который нельзя передать командной оболочке</translation>
+    </message>
+    <message>
+        <source>SQL request &apos;%1&apos; not mathed</source>
+        <translation>SQL-запрос '%1' не сопоставлен</translation>
+    </message>
+    <message>
+        <source>User name &apos;%1&apos; is not a plain SQL identifier</source>
+        <translation>Имя пользователя '%1' не является простым идентификатором SQL</translation>
+    </message>
+</context>
+<context>
     <name>Process</name>
     <message>
         <source>Process &apos;%1&apos; not finished</source>
