@@ -347,7 +347,7 @@ void TreeNodeModel::nodeDataChanged(TreeNode *node)
     const QModelIndex left = treeNodeToIndex(node);
     QModelIndex right;
     if (left.isValid())
-        right = left.column() == columns - 1 ? left : left.sibling(left.row(), columns - 1);
+        right = left.column() == columns - 1 ? left : createIndex(left.row(), columns - 1, left.internalPointer());
     // The root has no index of its own: its change is announced with two
     // invalid indexes, which views take as "repaint everything".
     Q_EMIT dataChanged(left, right, QVector<int>());
