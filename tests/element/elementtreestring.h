@@ -10,28 +10,11 @@
 
 #include <QRegularExpression>
 
-/*!
- * Element trees written as strings, for the element model and view tests.
- *
- * The notation is that of TreeString ("a[a1 a2] b"); each name is
- *   title[:type][@group][#flags]
- * for an element (type "user" unless given, group undefined unless given,
- * special flags 0 unless given), or "~id[#flags]" for a plain TreeNode that is
- * not an element. "staff@users[alice bob@admins] ~note s#1" is a group element
- * staff of the group users holding alice and bob, a plain node and an
- * element s marked hidden.
- */
-
-// An element that shows "<title>:<n>" in the columns after the first and
-// answers the special flags it is given.
+// An element showing "<title>:<n>" in column n > 0, with chosen special flags.
 class ListedElement : public TestElement<OrdinaryElement>
 {
 public:
-    ListedElement(Module &module, const QString &type, const QString &title)
-        : TestElement<OrdinaryElement>(module, rightsYes, type, title)
-    {
-    }
-
+    using TestElement<OrdinaryElement>::TestElement;
     QVariant data(int column, int role) const override
     {
         if (column > 0 && role == Qt::DisplayRole)
@@ -39,7 +22,6 @@ public:
         return TestElement<OrdinaryElement>::data(column, role);
     }
     int treeNodeSpecialFlags() const override { return specialFlags; }
-
     int specialFlags = 0;
 };
 
@@ -47,62 +29,54 @@ public:
 class ListedRoot : public ElementRootTreeNode
 {
 public:
-    explicit ListedRoot(int columns = 1)
-        : columns(columns)
-    {
-    }
-
+    explicit ListedRoot(int columns = 1) : columns(columns) {}
     int columnCount() const override { return columns; }
-    QVariant headerData(int section, Qt::Orientation orientation, int role) const override
-    {
-        if (section > 0 && orientation == Qt::Horizontal && role == Qt::DisplayRole)
-            return QStringLiteral("column %1").arg(section);
-        return ElementRootTreeNode::headerData(section, orientation, role);
-    }
-
     int columns;
 };
 
+/*
+ * Element trees in the notation of TreeString ("a[a1 a2] b"), each name being
+ * "title[:type][@group][#flags]" for an element (type "user" by default) or
+ * "~id[#flags]" for a plain node that is no element:
+ * "staff@users[alice bob@admins] ~note s#1".
+ */
 namespace ElementTreeString {
 
 inline TreeNode *makeNode(Module &module, const QString &name)
 {
     static const QRegularExpression pattern(
         QStringLiteral("^(~?)([^:@#~]+)(?::([^@#]+))?(?:@([^#]+))?(?:#(\\d+))?$"));
-    const QRegularExpressionMatch match = pattern.match(name);
-    if (!match.hasMatch())
+    const QRegularExpressionMatch m = pattern.match(name);
+    if (!m.hasMatch())
         qFatal("not an element tree name: %s", qPrintable(name));
-    if (!match.captured(1).isEmpty()) {
-        auto *node = new TestTreeNode(match.captured(2), &module);
+    if (!m.captured(1).isEmpty()) {
+        auto *node = new TestTreeNode(m.captured(2), &module);
         node->columns = 3;
-        node->specialFlags = match.captured(5).toInt();
+        node->specialFlags = m.captured(5).toInt();
         return node;
     }
-    const QString type = match.captured(3).isEmpty() ? QStringLiteral("user") : match.captured(3);
-    auto *element = new ListedElement(module, type, match.captured(2));
+    auto *element = new ListedElement(module, rightsYes, m.captured(3).isEmpty() ? "user" : m.captured(3),
+                                      m.captured(2));
     element->setParent(&module);
-    if (!match.captured(4).isEmpty())
-        element->setGroupType(match.captured(4));
-    element->specialFlags = match.captured(5).toInt();
+    if (!m.captured(4).isEmpty())
+        element->setGroupType(m.captured(4));
+    element->specialFlags = m.captured(5).toInt();
     return element;
 }
 
-// Every subtree is complete before it is hung, so each level is one
-// insertion.
+// Each subtree is complete before it is hung: one insertion per level.
 inline void mirror(Module &module, TreeNode *parent, const TreeNode *pattern)
 {
     QList<TreeNode *> nodes;
     for (const TreeNode *child : pattern->childNodes()) {
-        TreeNode *node = makeNode(module, child->id());
-        mirror(module, node, child);
-        nodes.append(node);
+        nodes.append(makeNode(module, child->id()));
+        mirror(module, nodes.last(), child);
     }
     if (!nodes.isEmpty())
         parent->append(nodes);
 }
 
-/*! Builds \a description below \a parent; the new nodes belong (as QObjects)
- *  to \a module. */
+// Builds the description below parent; the nodes belong to the module.
 inline void build(Module &module, TreeNode *parent, const QString &description)
 {
     TestTreeNode pattern(QStringLiteral("pattern"));
@@ -110,8 +84,7 @@ inline void build(Module &module, TreeNode *parent, const QString &description)
     mirror(module, parent, &pattern);
 }
 
-/*! The node below \a root whose title (or, for a plain node, id) is
- *  \a name, searched depth first; null if there is none. */
+// The first node below root, depth first, titled (a plain node: with id) name.
 inline TreeNode *find(const TreeNode *root, const QString &name)
 {
     for (TreeNode *child : root->childNodes()) {
