@@ -2,6 +2,54 @@
 <!DOCTYPE TS>
 <TS version="2.1" language="ru_RU">
 <context>
+    <name>AbstractChoiceDialog</name>
+    <message>
+        <source>Choice</source>
+        <translation>Выбор</translation>
+    </message>
+    <message>
+        <source>Filter</source>
+        <translation>Фильтр</translation>
+    </message>
+    <message>
+        <source>Pattern type</source>
+        <translation>Тип шаблона</translation>
+    </message>
+    <message>
+        <source>Wildcard</source>
+        <translation>Шаблон с подстановкой</translation>
+    </message>
+    <message>
+        <source>RegExp</source>
+        <comment>Regular expression</comment>
+        <translation>Регулярное выражение</translation>
+    </message>
+    <message>
+        <source>Fixed string</source>
+        <comment>Fixed String</comment>
+        <translation>Фиксированная строка</translation>
+    </message>
+    <message>
+        <source>Pattern</source>
+        <translation>Шаблон</translation>
+    </message>
+    <message>
+        <source>All</source>
+        <translation>Все</translation>
+    </message>
+</context>
+<context>
+    <name>ChoiceWidget</name>
+    <message>
+        <source>Add</source>
+        <translation>Добавить</translation>
+    </message>
+    <message>
+        <source>Remove</source>
+        <translation>Удалить</translation>
+    </message>
+</context>
+<context>
     <name>ConfRootTreeNode</name>
     <message>
         <source>Name</source>
@@ -24,6 +72,29 @@
     <message>
         <source>Name</source>
         <translation>Имя</translation>
+    </message>
+</context>
+<context>
+    <name>GecosDialog</name>
+    <message>
+        <source>GECOS</source>
+        <translation>GECOS</translation>
+    </message>
+    <message>
+        <source>Full name:</source>
+        <translation>Полное имя:</translation>
+    </message>
+    <message>
+        <source>Room number:</source>
+        <translation>Номер комнаты:</translation>
+    </message>
+    <message>
+        <source>Telephone:</source>
+        <translation>Телефон:</translation>
+    </message>
+    <message>
+        <source>Other:</source>
+        <translation>Прочее:</translation>
     </message>
 </context>
 <context>
@@ -53,6 +124,36 @@
     <message>
         <source>Description</source>
         <translation>Описание</translation>
+    </message>
+</context>
+<context>
+    <name>PasswordDialog</name>
+    <message>
+        <source>Enter login and password</source>
+        <translation>Введите имя пользователя и пароль</translation>
+    </message>
+    <message>
+        <source>Login:</source>
+        <translation>Имя пользователя:</translation>
+    </message>
+    <message>
+        <source>Password:</source>
+        <translation>Пароль:</translation>
+    </message>
+</context>
+<context>
+    <name>PasswordInputDialog</name>
+    <message>
+        <source>Change password</source>
+        <translation>Смена пароля</translation>
+    </message>
+    <message>
+        <source>Password:</source>
+        <translation>Пароль:</translation>
+    </message>
+    <message>
+        <source>Repeat:</source>
+        <translation>Повтор:</translation>
     </message>
 </context>
 <context>
