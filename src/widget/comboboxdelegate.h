@@ -1,0 +1,35 @@
+#ifndef KVT_COMBOBOXDELEGATE_H
+#define KVT_COMBOBOXDELEGATE_H
+
+#include "miscstyleditemdelegate.h"
+
+/*!
+ * Edits an int cell (the index of the chosen item, Qt::EditRole) with a
+ * combo box whose every selection is written to the model at once. The
+ * editor opens already dropped down, once; filling it again later does not
+ * reopen the list. Every cell of the column is painted as a combo box, edited
+ * or not.
+ *
+ * createEditor() returns an empty box: the items are supplied by the user of
+ * the delegate, typically a subclass that calls it and adds the texts.
+ */
+class KVTCOMMON_EXPORT ComboBoxDelegate : public MiscStyledItemDelegate
+{
+    Q_OBJECT
+
+public:
+    explicit ComboBoxDelegate(QObject *parent = nullptr);
+    ~ComboBoxDelegate() override;
+
+    void paint(QPainter *painter, const QStyleOptionViewItem &option, const QModelIndex &index) const override;
+    QWidget *createEditor(QWidget *parent, const QStyleOptionViewItem &option,
+                          const QModelIndex &index) const override;
+    void setEditorData(QWidget *editor, const QModelIndex &index) const override;
+    void setModelData(QWidget *editor, QAbstractItemModel *model, const QModelIndex &index) const override;
+
+protected:
+    // Set by createEditor(), cleared once setEditorData() has opened the list.
+    mutable bool _popupPending;
+};
+
+#endif // KVT_COMBOBOXDELEGATE_H

@@ -1,0 +1,25 @@
+#ifndef KVT_MULTICHECKTREEVIEW_H
+#define KVT_MULTICHECKTREEVIEW_H
+
+#include "kvtcommon_export.h"
+
+#include <QTreeView>
+
+/*!
+ * A tree view in which the space bar toggles the check boxes of all selected
+ * checkable items at once, each through its delegate as for a single item.
+ * With fewer than two such items selected, space behaves as in QTreeView.
+ */
+class KVTCOMMON_EXPORT MultiCheckTreeView : public QTreeView
+{
+    Q_OBJECT
+
+public:
+    explicit MultiCheckTreeView(QWidget *parent = nullptr);
+    ~MultiCheckTreeView() override;
+
+protected:
+    void keyPressEvent(QKeyEvent *event) override;
+};
+
+#endif // KVT_MULTICHECKTREEVIEW_H

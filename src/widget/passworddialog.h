@@ -1,0 +1,45 @@
+#ifndef KVT_PASSWORDDIALOG_H
+#define KVT_PASSWORDDIALOG_H
+
+#include "kvtcommon_export.h"
+
+#include <QDialog>
+
+namespace Ui {
+class PasswordDialog;
+}
+
+/*!
+ * Asks for a login and a password. OK is enabled while both are filled in;
+ * the state is computed when a text changes, so until then OK keeps the
+ * button box's enabled state (call checkValid() or set the texts first to
+ * start from the right state).
+ *
+ * The texts are returned as typed, not trimmed: blanks may belong to a
+ * password. Showing the dialog puts the focus on the login with its text
+ * selected.
+ */
+class KVTCOMMON_EXPORT PasswordDialog : public QDialog
+{
+    Q_OBJECT
+
+public:
+    explicit PasswordDialog(QWidget *parent = nullptr);
+    ~PasswordDialog() override;
+
+    QString user() const;
+    QString password() const;
+    /*! Sets the login; the same text as shown is left alone, so the cursor
+     *  stays and no change is signalled. */
+    void setUser(const QString &user);
+
+public Q_SLOTS:
+    void checkValid();
+
+protected:
+    void showEvent(QShowEvent *event) override;
+
+    Ui::PasswordDialog *_ui;
+};
+
+#endif // KVT_PASSWORDDIALOG_H

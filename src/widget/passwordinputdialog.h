@@ -1,0 +1,35 @@
+#ifndef KVT_PASSWORDINPUTDIALOG_H
+#define KVT_PASSWORDINPUTDIALOG_H
+
+#include "kvtcommon_export.h"
+
+#include <QDialog>
+
+namespace Ui {
+class PasswordInputDialog;
+}
+
+/*!
+ * Asks for a new password twice. OK is enabled while the password is not
+ * empty and the repetition is exactly the same text; the state is computed
+ * when a text changes (call validate() to compute it before that).
+ */
+class KVTCOMMON_EXPORT PasswordInputDialog : public QDialog
+{
+    Q_OBJECT
+
+public:
+    explicit PasswordInputDialog(QWidget *parent = nullptr);
+    ~PasswordInputDialog() override;
+
+    QString password() const;
+
+public Q_SLOTS:
+    void validate();
+    int exec() override;
+
+protected:
+    Ui::PasswordInputDialog *_ui;
+};
+
+#endif // KVT_PASSWORDINPUTDIALOG_H

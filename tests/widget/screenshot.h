@@ -1,0 +1,19 @@
+#ifndef KVT_TEST_SCREENSHOT_H
+#define KVT_TEST_SCREENSHOT_H
+
+#include <QDir>
+#include <QPixmap>
+#include <QWidget>
+
+// Keeps a picture of a widget under the build tree (screenshots/<name>.png)
+// so that a person can look at the dialogs; returns whether it was written.
+inline bool keepScreenshot(QWidget *widget, const QString &name)
+{
+    const QString dir = QStringLiteral(KVT_SCREENSHOT_DIR);
+    if (!QDir().mkpath(dir))
+        return false;
+    const QPixmap picture = widget->grab();
+    return !picture.isNull() && picture.save(dir + QLatin1Char('/') + name + QStringLiteral(".png"));
+}
+
+#endif
