@@ -2,6 +2,54 @@
 <!DOCTYPE TS>
 <TS version="2.1" language="ru_RU">
 <context>
+    <name>AbstractChoiceDialog</name>
+    <message>
+        <source>Choice</source>
+        <translation>Выбор</translation>
+    </message>
+    <message>
+        <source>Filter</source>
+        <translation>Фильтр</translation>
+    </message>
+    <message>
+        <source>Pattern type</source>
+        <translation>Тип шаблона</translation>
+    </message>
+    <message>
+        <source>Wildcard</source>
+        <translation>Шаблон с подстановкой</translation>
+    </message>
+    <message>
+        <source>RegExp</source>
+        <comment>Regular expression</comment>
+        <translation>Регулярное выражение</translation>
+    </message>
+    <message>
+        <source>Fixed string</source>
+        <comment>Fixed String</comment>
+        <translation>Фиксированная строка</translation>
+    </message>
+    <message>
+        <source>Pattern</source>
+        <translation>Шаблон</translation>
+    </message>
+    <message>
+        <source>All</source>
+        <translation>Все</translation>
+    </message>
+</context>
+<context>
+    <name>ChoiceWidget</name>
+    <message>
+        <source>Add</source>
+        <translation>Добавить</translation>
+    </message>
+    <message>
+        <source>Remove</source>
+        <translation>Удалить</translation>
+    </message>
+</context>
+<context>
     <name>ConfRootTreeNode</name>
     <message>
         <source>Name</source>
@@ -24,6 +72,29 @@
     <message>
         <source>Name</source>
         <translation>Имя</translation>
+    </message>
+</context>
+<context>
+    <name>GecosDialog</name>
+    <message>
+        <source>GECOS</source>
+        <translation>GECOS</translation>
+    </message>
+    <message>
+        <source>Full name:</source>
+        <translation>Полное имя:</translation>
+    </message>
+    <message>
+        <source>Room number:</source>
+        <translation>Номер комнаты:</translation>
+    </message>
+    <message>
+        <source>Telephone:</source>
+        <translation>Телефон:</translation>
+    </message>
+    <message>
+        <source>Other:</source>
+        <translation>Прочее:</translation>
     </message>
 </context>
 <context>
@@ -56,22 +127,52 @@
     </message>
 </context>
 <context>
+    <name>PasswordDialog</name>
+    <message>
+        <source>Enter login and password</source>
+        <translation>Введите имя пользователя и пароль</translation>
+    </message>
+    <message>
+        <source>Login:</source>
+        <translation>Имя пользователя:</translation>
+    </message>
+    <message>
+        <source>Password:</source>
+        <translation>Пароль:</translation>
+    </message>
+</context>
+<context>
+    <name>PasswordInputDialog</name>
+    <message>
+        <source>Change password</source>
+        <translation>Смена пароля</translation>
+    </message>
+    <message>
+        <source>Password:</source>
+        <translation>Пароль:</translation>
+    </message>
+    <message>
+        <source>Repeat:</source>
+        <translation>Повтор:</translation>
+    </message>
+</context>
+<context>
     <name>PgsqlCluster</name>
     <message>
         <source>Cluster info not valid &apos;%1&apos;</source>
-        <translation>Неверные сведения о кластере '%1'</translation>
+        <translation>Неверные сведения о кластере &apos;%1&apos;</translation>
     </message>
     <message>
         <source>SQL request &apos;%1&apos; contains a character that cannot be passed to the shell</source>
-        <translation>SQL-запрос '%1' содержит символ, который нельзя передать командной оболочке</translation>
+        <translation>SQL-запрос &apos;%1&apos; содержит символ, который нельзя передать командной оболочке</translation>
     </message>
     <message>
         <source>SQL request &apos;%1&apos; not mathed</source>
-        <translation>SQL-запрос '%1' не сопоставлен</translation>
+        <translation>SQL-запрос &apos;%1&apos; не сопоставлен</translation>
     </message>
     <message>
         <source>User name &apos;%1&apos; is not a plain SQL identifier</source>
-        <translation>Имя пользователя '%1' не является простым идентификатором SQL</translation>
+        <translation>Имя пользователя &apos;%1&apos; не является простым идентификатором SQL</translation>
     </message>
 </context>
 <context>
