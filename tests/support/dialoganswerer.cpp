@@ -3,6 +3,7 @@
 #include <QAbstractButton>
 #include <QApplication>
 #include <QFileDialog>
+#include <QLineEdit>
 
 DialogAnswerer::DialogAnswerer(QObject *parent)
     : QObject(parent)
@@ -39,6 +40,10 @@ void DialogAnswerer::poll()
             files->reject();
         } else {
             files->selectFile(name);
+            // The dialog may still fill in its suggested name while it
+            // settles; what is typed is what it takes.
+            if (auto *edit = files->findChild<QLineEdit *>(QStringLiteral("fileNameEdit")))
+                edit->setText(name);
             QMetaObject::invokeMethod(files, "accept");
         }
         return;
