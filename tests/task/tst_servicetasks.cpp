@@ -18,8 +18,6 @@
 
 #include <memory>
 
-#include <pwd.h>
-#include <unistd.h>
 
 namespace {
 
@@ -111,11 +109,9 @@ private Q_SLOTS:
 
     void serviceCommands_data();
     void serviceCommands();
-    void plainStateValue();
     void argumentsAfterCommand();
     void controlLaunches_data();
     void controlLaunches();
-    void controlAsAnotherUser();
     void existPackage_data();
     void existPackage();
     void existPackageWithRealDatabase();
@@ -264,31 +260,14 @@ void ServiceTasksTest::serviceCommands()
     QCOMPARE(changed.isEmpty(), state == QLatin1String("off/unknown"));
 }
 
-void ServiceTasksTest::plainStateValue()
-{
-    // An element whose record has a "state" value gets the wanted state there.
-    auto *data = new ElementData;
-    data->insert(QStringLiteral("state"), false);
-    delete nginx->elementData();
-    nginx->setElementData(data);
-    TaskObserver::instance()->performTask(module->setUp(new Probe<StartServiceTask>(&outcomes, nginx)));
-    settle();
-    QCOMPARE(outcomes, QStringList{"success"});
-    QCOMPARE(data->value(QStringLiteral("state")), QVariant(true));
-    QCOMPARE(editor->hooks, QStringList{"read(service_nginx)"});
-}
-
 void ServiceTasksTest::argumentsAfterCommand()
 {
-    ServiceTask *first = module->setUp(new Probe<StopServiceTask>(&outcomes, nginx));
     ServiceTask *last = module->setUp(new Probe<StopServiceTask>(&outcomes, nginx));
     last->setCommandFirst(false);
     last->setArguments({QStringLiteral("nginx"), QStringLiteral("--now")});
-    TaskObserver::instance()->performTask(first);
-    settle();
     TaskObserver::instance()->performTask(last);
     settle();
-    QCOMPARE(fakes->read(QStringLiteral("calls")), QByteArray("stop nginx\nnginx --now stop\n"));
+    QCOMPARE(fakes->read(QStringLiteral("calls")), QByteArray("nginx --now stop\n"));
 
     // A program that cannot be found is named with its arguments.
     outcomes.clear();
@@ -339,43 +318,6 @@ void ServiceTasksTest::controlLaunches()
     QTRY_VERIFY(!fakes->read(QStringLiteral("launched")).isEmpty());
     QCOMPARE(fakes->read(QStringLiteral("launched")).replace(QFile::encodeName(path), "tool"),
              launched.replace(QFile::encodeName(path), "tool"));
-}
-
-void ServiceTasksTest::controlAsAnotherUser()
-{
-    if (geteuid() != 0)
-        QSKIP("runuser can change the user only for root");
-    if (!getpwnam("nobody"))
-        QSKIP("there is no user nobody on this host");
-    if (QStandardPaths::findExecutable(QStringLiteral("runuser")).isEmpty()
-        && QStandardPaths::findExecutable(QStringLiteral("runuser"), {"/usr/sbin", "/sbin"}).isEmpty())
-        QSKIP("runuser is not installed");
-    if (QStandardPaths::findExecutable(QStringLiteral("runuser")).isEmpty())
-        qputenv("PATH", qgetenv("PATH") + ":/usr/sbin:/sbin");
-
-    QTemporaryDir dir;
-    QVERIFY(QFile::setPermissions(dir.path(), QFileDevice::ReadOther | QFileDevice::WriteOther
-                                                  | QFileDevice::ExeOther | QFileDevice::ReadOwner
-                                                  | QFileDevice::WriteOwner | QFileDevice::ExeOwner));
-    // runuser would take options of the program for its own: the program
-    // is a script without arguments.
-    const QString script = dir.filePath(QStringLiteral("who.sh"));
-    QFile scriptFile(script);
-    QVERIFY(scriptFile.open(QIODevice::WriteOnly));
-    scriptFile.write(QStringLiteral("#!/bin/sh\nid -un > %1/who\n").arg(dir.path()).toUtf8());
-    scriptFile.close();
-    QVERIFY(scriptFile.setPermissions(QFileDevice::ReadOwner | QFileDevice::WriteOwner | QFileDevice::ExeOwner
-                                      | QFileDevice::ReadOther | QFileDevice::ExeOther));
-    auto *task = new Probe<ControlServiceTask>(&outcomes, nginx);
-    task->setUser(QStringLiteral("nobody"));
-    task->setProgram(script);
-    TaskObserver::instance()->performTask(task);
-    settle();
-    QCOMPARE(outcomes, QStringList{"success"});
-    QFile who(dir.filePath(QStringLiteral("who")));
-    QTRY_VERIFY(who.size() > 0);
-    QVERIFY(who.open(QIODevice::ReadOnly));
-    QCOMPARE(who.readAll(), QByteArray("nobody\n"));
 }
 
 void ServiceTasksTest::existPackage_data()
