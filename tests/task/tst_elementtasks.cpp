@@ -222,6 +222,7 @@ private:
     Workers workers;
     FakeSystem system;
     QStringList outcomes;
+    ElementRootTreeNode *root = nullptr;
     std::unique_ptr<UsersModule> module;
     Container *users = nullptr;
     Ordinary *alice = nullptr;
@@ -253,7 +254,7 @@ void ElementTasksTest::init()
     outcomes.clear();
     module.reset(new UsersModule(&system, &outcomes));
     UsersModule::current = module.get();
-    auto *root = new ElementRootTreeNode(module.get());
+    root = new ElementRootTreeNode(module.get());
     users = new Container(*module, rightsYes, QStringLiteral("users"), QStringLiteral("users"));
     alice = new Ordinary(*module, rightsYes, QStringLiteral("user"), QStringLiteral("alice"));
     root->append(users);
@@ -269,6 +270,8 @@ void ElementTasksTest::init()
 void ElementTasksTest::cleanup()
 {
     settle();
+    // Tree nodes do not own their children.
+    root->clearDeleteAll();
     module.reset();
     TaskObserverDialog *dialog = TaskObserver::instance()->dialog();
     if (dialog->isVisible())

@@ -131,6 +131,7 @@ private:
     }
 
     Workers workers;
+    ElementRootTreeNode *root = nullptr;
     std::unique_ptr<FakePrograms> fakes;
     QString program;
     QStringList outcomes;
@@ -158,7 +159,7 @@ void ServiceTasksTest::init()
     module.reset(new ServicesModule(&outcomes, program));
     // Not what an earlier test left in the settings.
     module->moduleDataRef()->insert(QStringLiteral("paranoid"), false);
-    auto *root = new ElementRootTreeNode(module.get());
+    root = new ElementRootTreeNode(module.get());
     nginx = new Service(*module);
     static_cast<ServiceLightElementData *>(nginx->elementData())->setState(false, QStringLiteral("unknown"));
     root->append(nginx);
@@ -171,6 +172,8 @@ void ServiceTasksTest::init()
 void ServiceTasksTest::cleanup()
 {
     settle();
+    // Tree nodes do not own their children.
+    root->clearDeleteAll();
     module.reset();
     fakes.reset();
     TaskObserverDialog *dialog = TaskObserver::instance()->dialog();

@@ -110,6 +110,9 @@ void ElementWidgetTest::init()
 
 void ElementWidgetTest::cleanup()
 {
+    // Tree nodes do not own their children.
+    if (module)
+        root->clearDeleteAll();
     module.reset();
     qDeleteAll(received);
     received.clear();
@@ -331,6 +334,7 @@ void ElementWidgetTest::moduleKeepsOneWidgetPerType()
     delete group;
     QVERIFY(!module->elementWidget(QStringLiteral("group")));
 
+    root->clearDeleteAll();
     module.reset();
     QVERIFY(!first);
 }
