@@ -6,12 +6,23 @@
 #include <QStringList>
 #include <QTimer>
 
+#include <functional>
+
+class QDialog;
+
 /*!
- * Answers the message boxes a test provokes, so that no test waits on a
- * dialog. While it lives it polls QApplication::activeModalWidget(); each
- * message box it finds is recorded as "<title>|<text>|<buttons>" (buttons as
- * the sum of their QMessageBox::StandardButton values) and answered with the
- * next queued button, or closed with Escape when none is queued.
+ * Answers the modal dialogs a test provokes, so that no test waits on one.
+ * While it lives it polls QApplication::activeModalWidget(); the task
+ * observer's dialogs are left alone.
+ *
+ * - A message box is recorded as "<title>|<text>|<buttons>" (buttons as the
+ *   sum of their QMessageBox::StandardButton values) and answered with the
+ *   next queued button, or closed with Escape when none is queued.
+ * - A file dialog is recorded as "file:<title>" and given the next queued
+ *   file name, or cancelled when none is queued.
+ * - Any other dialog is recorded as "dialog:<class name>", shown to inspect
+ *   when set, and accepted when the next queued button is Ok, Yes or Save,
+ *   rejected otherwise.
  */
 class DialogAnswerer : public QObject
 {
@@ -21,8 +32,10 @@ public:
     explicit DialogAnswerer(QObject *parent = nullptr);
 
     void answer(QMessageBox::StandardButton button) { _answers.append(button); }
+    void answerFile(const QString &fileName) { _files.append(fileName); }
 
     QStringList seen;
+    std::function<void(QDialog *)> inspect;
 
 private Q_SLOTS:
     void poll();
@@ -30,6 +43,7 @@ private Q_SLOTS:
 private:
     QTimer _timer;
     QList<QMessageBox::StandardButton> _answers;
+    QStringList _files;
 };
 
 #endif

@@ -50,19 +50,6 @@ public:
     QList<int> requested;
 };
 
-// A list-like widget without the edit cycle.
-class PlainWidget : public ElementWidget
-{
-public:
-    PlainWidget(Module &module, const QString &type, int priority = 500)
-        : ElementWidget(module, rightsYes)
-    {
-        _elementType = type;
-        _priority = priority;
-    }
-    QString toolTipText() const override { return QStringLiteral("plain"); }
-};
-
 QList<int> states(const QSignalSpy &spy)
 {
     QList<int> result;
@@ -82,21 +69,15 @@ private Q_SLOTS:
     void init();
     void cleanup();
 
-    void defaults();
     void setElement_data();
     void setElement();
     void readOnProgrammaticShowOnly();
-    void successfulRead_data();
-    void successfulRead();
     void editing_data();
     void editing();
-    void applyContentChanges_data();
-    void applyContentChanges();
     void setTreeNodeCurrent_data();
     void setTreeNodeCurrent();
     void noSetTreeNodeCurrent();
     void moduleKeepsOneWidgetPerType();
-    void moduleRelaysContentChanges();
 
 private:
     std::unique_ptr<RecordingModule> module;
@@ -129,38 +110,12 @@ void ElementWidgetTest::init()
 
 void ElementWidgetTest::cleanup()
 {
+    // Tree nodes do not own their children.
+    if (module)
+        root->clearDeleteAll();
     module.reset();
     qDeleteAll(received);
     received.clear();
-}
-
-void ElementWidgetTest::defaults()
-{
-    PlainWidget plain(*module, QStringLiteral("user"));
-    QCOMPARE(plain.priority(), 500);
-    QCOMPARE(plain.supplementElementWidgetType(), ContextOperation::undefinedElementType);
-    QCOMPARE(plain.role(), NoElementRole);
-    QVERIFY(!plain.element());
-    QCOMPARE(plain.contextType(), ContextOperation::ElementWidgetContextType);
-    QCOMPARE(plain.availableOperations(), quint64(0));
-    QCOMPARE(plain.elementWidgetContext(), &plain);
-    QVERIFY(!plain.elementContext());
-    QVERIFY(!alice->elementWidgetContext());
-    QCOMPARE(plain.caption(), QString());
-    plain.setElement(alice, EditElementRole);
-    QCOMPARE(plain.caption(), QStringLiteral("alice"));
-    QCOMPARE(static_cast<ContextOperation &>(plain).caption(), QStringLiteral("alice"));
-    QCOMPARE(alice->caption(), QStringLiteral("alice"));
-
-    EditWidget editor(*module, rightsYes);
-    QCOMPARE(editor.availableOperations(), quint64(CreateOperation));
-    QVERIFY(!editor.isChanged());
-
-    PlainWidget late(*module, QStringLiteral("a"), 900), early(*module, QStringLiteral("b"), 100),
-        middle(*module, QStringLiteral("c"));
-    QList<ElementWidget *> widgets{&late, &early, &middle};
-    std::sort(widgets.begin(), widgets.end(), ElementWidget::priorityLessThen);
-    QCOMPARE(widgets, (QList<ElementWidget *>{&early, &middle, &late}));
 }
 
 void ElementWidgetTest::setElement_data()
@@ -239,48 +194,6 @@ void ElementWidgetTest::readOnProgrammaticShowOnly()
     QCOMPARE(module->log, QStringList{});
 }
 
-void ElementWidgetTest::successfulRead_data()
-{
-    QTest::addColumn<bool>("mayEdit");
-    QTest::addColumn<bool>("sameElement");
-    QTest::addColumn<bool>("enabled");
-    QTest::addColumn<bool>("stillChanged");
-    QTest::addColumn<QList<int>>("reported");
-    QTest::addColumn<int>("operationsChanged");
-
-    QTest::newRow("own element") << true << true << true << false << QList<int>{0} << 1;
-    QTest::newRow("own element, read only") << false << true << false << false << QList<int>{0} << 1;
-    // A late read of the element shown before: frees the controls only.
-    QTest::newRow("other element") << true << false << true << true << QList<int>{} << 0;
-}
-
-void ElementWidgetTest::successfulRead()
-{
-    QFETCH(bool, mayEdit);
-    QFETCH(bool, sameElement);
-    QFETCH(bool, enabled);
-    QFETCH(bool, stillChanged);
-    QFETCH(QList<int>, reported);
-    QFETCH(int, operationsChanged);
-
-    EditWidget *editor = newEditor(mayEdit ? rightsYes : rightsNo);
-    editor->setElement(alice, EditElementRole);
-    editor->userTypes(QStringLiteral("unsaved"));
-    QSignalSpy content(editor, SIGNAL(contentChanged(int)));
-    QSignalSpy operations(editor, SIGNAL(elementContextOperationChanged(Element *)));
-
-    ElementData data;
-    data.insert(QStringLiteral("text"), QStringLiteral("from the system"));
-    editor->afterSuccessfulRead(sameElement ? alice : bob, &data);
-    QCOMPARE(editor->isEnabled(), enabled);
-    QCOMPARE(editor->isEditBlocked(), !enabled);
-    QCOMPARE(editor->isChanged(), stillChanged);
-    QCOMPARE(states(content), reported);
-    QCOMPARE(operations.count(), operationsChanged);
-    if (operationsChanged)
-        QCOMPARE(operations.first().first().value<Element *>(), alice);
-}
-
 void ElementWidgetTest::editing_data()
 {
     QTest::addColumn<ElementWidgetRole>("role");
@@ -322,45 +235,6 @@ void ElementWidgetTest::editing()
     }
     QCOMPARE(states(spy), reported);
     QCOMPARE(editor->isChanged(), changed);
-}
-
-void ElementWidgetTest::applyContentChanges_data()
-{
-    QTest::addColumn<QString>("target");
-    QTest::addColumn<ElementWidgetRole>("role");
-    QTest::addColumn<QStringList>("operations");
-
-    QTest::newRow("update") << "alice" << EditElementRole << QStringList{"Update(user_alice)"};
-    QTest::newRow("element offers no update") << "readonly" << EditElementRole << QStringList{};
-    // Without an element the widget itself is the context of the creation.
-    QTest::newRow("create") << "" << CreateElementRole << QStringList{"Create(widget)"};
-}
-
-void ElementWidgetTest::applyContentChanges()
-{
-    QFETCH(QString, target);
-    QFETCH(ElementWidgetRole, role);
-    QFETCH(QStringList, operations);
-
-    auto *readonly = new Ordinary(*module, rightsNo, QStringLiteral("user"), QStringLiteral("ro"));
-    root->append(readonly);
-    module->log.clear();
-    Element *element = target == QLatin1String("alice") ? alice : target.isEmpty() ? nullptr : readonly;
-
-    EditWidget *editor = newEditor();
-    editor->setElement(element, role);
-    editor->userTypes(QStringLiteral("carol"));
-    editor->applyContentChanges();
-    QCOMPARE(module->log, operations);
-    if (operations.isEmpty()) {
-        QVERIFY(received.isEmpty());
-        return;
-    }
-    // The exported content travels with the operation.
-    QCOMPARE(received.size(), 1);
-    QCOMPARE(received.first()->value(QStringLiteral("text")).toString(), QStringLiteral("carol"));
-    // Applying is not saving: the change stays until the task reports back.
-    QVERIFY(editor->isChanged());
 }
 
 void ElementWidgetTest::setTreeNodeCurrent_data()
@@ -460,22 +334,9 @@ void ElementWidgetTest::moduleKeepsOneWidgetPerType()
     delete group;
     QVERIFY(!module->elementWidget(QStringLiteral("group")));
 
+    root->clearDeleteAll();
     module.reset();
     QVERIFY(!first);
-}
-
-void ElementWidgetTest::moduleRelaysContentChanges()
-{
-    EditWidget *editor = newEditor();
-    module->insertElementWidget(new PlainWidget(*module, QStringLiteral("list")));
-    editor->setElement(alice, EditElementRole);
-    QSignalSpy relayed(module.get(), SIGNAL(contentElementWidgetChanged(int)));
-    module->connectElementWidgets();
-    module->connectElementWidgets(); // a second call adds no second relay
-    editor->userTypes(QStringLiteral("x"));
-    editor->userTypes(QString());
-    editor->setUnchanged();
-    QCOMPARE(states(relayed), (QList<int>{3, 2, 0}));
 }
 
 QTEST_MAIN(ElementWidgetTest)

@@ -1,0 +1,23 @@
+#ifndef KVT_EXPORTWIDGETTASK_H
+#define KVT_EXPORTWIDGETTASK_H
+
+#include "elementwidgettask.h"
+
+#include <QCoreApplication>
+
+/*!
+ * Exports \a widget's content. A plugin derives from it and does the work
+ * in run(); success is confirmed to the user by a message box.
+ */
+class KVTCOMMON_EXPORT ExportWidgetTask : public ElementWidgetTask
+{
+    Q_DECLARE_TR_FUNCTIONS(ExportWidgetTask)
+
+public:
+    ExportWidgetTask(ElementWidget *widget, ElementData *data);
+    ~ExportWidgetTask() override;
+
+    void afterRun() override;
+};
+
+#endif // KVT_EXPORTWIDGETTASK_H

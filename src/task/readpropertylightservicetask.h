@@ -1,0 +1,19 @@
+#ifndef KVT_READPROPERTYLIGHTSERVICETASK_H
+#define KVT_READPROPERTYLIGHTSERVICETASK_H
+
+#include "servicetask.h"
+
+/*!
+ * Asks a service's control program for the "status" and copies the state
+ * into the element's ServiceLightElementData, so that views show it.
+ */
+class KVTCOMMON_EXPORT ReadPropertyLightServiceTask : public ServiceTask
+{
+public:
+    explicit ReadPropertyLightServiceTask(Element *element);
+    ~ReadPropertyLightServiceTask() override;
+
+    void afterRun() override;
+};
+
+#endif // KVT_READPROPERTYLIGHTSERVICETASK_H

@@ -1,0 +1,9 @@
+#include "reloadservicetask.h"
+
+ReloadServiceTask::ReloadServiceTask(Element *element)
+    : RServiceTask(element)
+{
+    _command = QStringLiteral("reload");
+}
+
+ReloadServiceTask::~ReloadServiceTask() = default;

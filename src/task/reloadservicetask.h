@@ -1,0 +1,14 @@
+#ifndef KVT_RELOADSERVICETASK_H
+#define KVT_RELOADSERVICETASK_H
+
+#include "rservicetask.h"
+
+/*! Reloads a service: runs its control program with "reload". */
+class KVTCOMMON_EXPORT ReloadServiceTask : public RServiceTask
+{
+public:
+    explicit ReloadServiceTask(Element *element);
+    ~ReloadServiceTask() override;
+};
+
+#endif // KVT_RELOADSERVICETASK_H

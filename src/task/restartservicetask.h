@@ -1,0 +1,14 @@
+#ifndef KVT_RESTARTSERVICETASK_H
+#define KVT_RESTARTSERVICETASK_H
+
+#include "rservicetask.h"
+
+/*! Restarts a service: runs its control program with "restart". */
+class KVTCOMMON_EXPORT RestartServiceTask : public RServiceTask
+{
+public:
+    explicit RestartServiceTask(Element *element);
+    ~RestartServiceTask() override;
+};
+
+#endif // KVT_RESTARTSERVICETASK_H

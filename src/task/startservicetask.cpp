@@ -1,0 +1,9 @@
+#include "startservicetask.h"
+
+StartServiceTask::StartServiceTask(Element *element)
+    : StartStopServiceTask(element, true)
+{
+    _command = QStringLiteral("start");
+}
+
+StartServiceTask::~StartServiceTask() = default;

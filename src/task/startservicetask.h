@@ -1,0 +1,14 @@
+#ifndef KVT_STARTSERVICETASK_H
+#define KVT_STARTSERVICETASK_H
+
+#include "startstopservicetask.h"
+
+/*! Starts a service: runs its control program with "start". */
+class KVTCOMMON_EXPORT StartServiceTask : public StartStopServiceTask
+{
+public:
+    explicit StartServiceTask(Element *element);
+    ~StartServiceTask() override;
+};
+
+#endif // KVT_STARTSERVICETASK_H

@@ -1,0 +1,9 @@
+#include "stopservicetask.h"
+
+StopServiceTask::StopServiceTask(Element *element)
+    : StartStopServiceTask(element, false)
+{
+    _command = QStringLiteral("stop");
+}
+
+StopServiceTask::~StopServiceTask() = default;

@@ -1,0 +1,14 @@
+#ifndef KVT_STOPSERVICETASK_H
+#define KVT_STOPSERVICETASK_H
+
+#include "startstopservicetask.h"
+
+/*! Stops a service: runs its control program with "stop". */
+class KVTCOMMON_EXPORT StopServiceTask : public StartStopServiceTask
+{
+public:
+    explicit StopServiceTask(Element *element);
+    ~StopServiceTask() override;
+};
+
+#endif // KVT_STOPSERVICETASK_H
