@@ -61,6 +61,20 @@
     </message>
 </context>
 <context>
+    <name>ControlServiceTask</name>
+    <message>
+        <source>Failed to execute command &quot;%1 %2&quot;</source>
+        <translation>Не удалось выполнить команду "%1 %2"</translation>
+    </message>
+</context>
+<context>
+    <name>DummyTask</name>
+    <message>
+        <source>Dummy task</source>
+        <translation>Пробная задача</translation>
+    </message>
+</context>
+<context>
     <name>Element</name>
     <message>
         <source>Do you really want to remove this element?</source>
@@ -72,6 +86,30 @@
     <message>
         <source>Name</source>
         <translation>Имя</translation>
+    </message>
+</context>
+<context>
+    <name>ExportHtmlTask</name>
+    <message>
+        <source>Export to HTML</source>
+        <translation>Экспорт в HTML</translation>
+    </message>
+    <message>
+        <source>&quot;%1&quot; error %2
+%3</source>
+        <translation>"%1" ошибка %2
+%3</translation>
+    </message>
+</context>
+<context>
+    <name>ExportWidgetTask</name>
+    <message>
+        <source>Export</source>
+        <translation>Экспорт</translation>
+    </message>
+    <message>
+        <source>Export success!</source>
+        <translation>Экспорт выполнен успешно!</translation>
     </message>
 </context>
 <context>
@@ -176,6 +214,40 @@
     </message>
 </context>
 <context>
+    <name>PreviewDialog</name>
+    <message>
+        <source>Print preview</source>
+        <translation>Предварительный просмотр</translation>
+    </message>
+    <message>
+        <source>Export</source>
+        <translation>Экспорт</translation>
+    </message>
+    <message>
+        <source>Print</source>
+        <translation>Печать</translation>
+    </message>
+    <message>
+        <source>Export preview to HTML</source>
+        <translation>Экспорт просмотра в HTML</translation>
+    </message>
+    <message>
+        <source>HTML (*.html)</source>
+        <translation>HTML (*.html)</translation>
+    </message>
+</context>
+<context>
+    <name>PrintWidgetTask</name>
+    <message>
+        <source>Internal error: %1</source>
+        <translation>Внутренняя ошибка: %1</translation>
+    </message>
+    <message>
+        <source>XML transformation failed</source>
+        <translation>Ошибка преобразования XML</translation>
+    </message>
+</context>
+<context>
     <name>Process</name>
     <message>
         <source>Process &apos;%1&apos; not finished</source>
@@ -223,6 +295,38 @@
 &quot;%4&quot;</source>
         <translation>Процесс: &quot;%1 %2&quot;. Код завершения: %3.
 &quot;%4&quot;</translation>
+    </message>
+</context>
+<context>
+    <name>ServiceTask</name>
+    <message>
+        <source>Process: &quot;%1 %2&quot;. Error: %3.
+&quot;Not started&quot;</source>
+        <translation>Процесс: "%1 %2". Ошибка: %3.
+"Не запущен"</translation>
+    </message>
+    <message>
+        <source>Process: &quot;%1 %2&quot;. Error: %3.
+&quot;Not finished&quot;</source>
+        <translation>Процесс: "%1 %2". Ошибка: %3.
+"Не завершён"</translation>
+    </message>
+    <message>
+        <source>Process: &quot;%1 %2&quot;. Exit code: %3.
+&quot;%4&quot;</source>
+        <translation>Процесс: "%1 %2". Код завершения: %3.
+"%4"</translation>
+    </message>
+</context>
+<context>
+    <name>StoppableDummyTask</name>
+    <message>
+        <source>Stoppable dummy task</source>
+        <translation>Останавливаемая пробная задача</translation>
+    </message>
+    <message>
+        <source>Terminate by user</source>
+        <translation>Прервано пользователем</translation>
     </message>
 </context>
 <context>
