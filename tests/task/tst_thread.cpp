@@ -106,6 +106,8 @@ void ThreadTest::destroyingOneStopsAll()
     for (int i = 0; i < 3; ++i)
         QVERIFY(putOnceOpen(new TestTask(&counters, QString::number(i))));
     QTRY_COMPARE(int(counters.destroyed), 3);
+    for (Thread *w : workers)
+        QTRY_VERIFY(w->threadIndex() >= 0);
     QList<int> indexes;
     for (Thread *w : workers)
         indexes.append(w->threadIndex());
