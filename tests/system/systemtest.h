@@ -46,12 +46,15 @@ public:
     QString filePath(const QString &name) const { return _dir.filePath(name); }
     // Leaves the fake folder alone on PATH, so that every other program is missing.
     void useOnlyFakes() { qputenv("PATH", QFile::encodeName(_dir.path())); }
-    // An executable script `name` running \a body under /bin/sh.
-    void add(const QString &name, const QByteArray &body)
+    // An executable script `name` running \a body under /bin/sh; returns its path.
+    QString add(const QString &name, const QByteArray &body)
     {
         writeFile(filePath(name), "#!/bin/sh\n" + body + '\n');
         QFile::setPermissions(filePath(name), QFileDevice::ReadOwner | QFileDevice::WriteOwner | QFileDevice::ExeOwner);
+        return filePath(name);
     }
+    // What a fake wrote into the file `name` of the fake folder.
+    QByteArray read(const QString &name) const { return readFile(filePath(name)); }
 
 private:
     QTemporaryDir _dir;

@@ -9,7 +9,7 @@
 #include <kvt-common/stopservicetask.h>
 #include <kvt-common/taskobserverdialog.h>
 
-#include "../system/fakeprograms.h"
+#include "../system/systemtest.h"
 #include "../widget/editwidget.h"
 #include "recordingmodule.h"
 #include "taskprobe.h"
