@@ -56,6 +56,63 @@
     </message>
 </context>
 <context>
+    <name>PluginContainer</name>
+    <message>
+        <source>Plugin directory &apos;%1&apos; not exist.</source>
+        <translation>Каталог модулей расширения «%1» не существует.</translation>
+    </message>
+    <message>
+        <source>The plugin has no root object.</source>
+        <translation>У модуля расширения нет корневого объекта.</translation>
+    </message>
+    <message>
+        <source>The plugin does not implement the interface %1.</source>
+        <translation>Модуль расширения не реализует интерфейс %1.</translation>
+    </message>
+    <message>
+        <source>The plugin cannot work on this system.</source>
+        <translation>Модуль расширения не может работать в этой системе.</translation>
+    </message>
+</context>
+<context>
+    <name>PluginDialog</name>
+    <message>
+        <source>Plugins and modules</source>
+        <translation>Модули расширения и модули</translation>
+    </message>
+    <message>
+        <source>Plugin path:</source>
+        <translation>Путь к модулям расширения:</translation>
+    </message>
+    <message>
+        <source>Change</source>
+        <translation>Изменить</translation>
+    </message>
+    <message>
+        <source>Plugins</source>
+        <translation>Модули расширения</translation>
+    </message>
+    <message>
+        <source>Modules</source>
+        <translation>Модули</translation>
+    </message>
+    <message>
+        <source>Plugin directory</source>
+        <translation>Каталог модулей расширения</translation>
+    </message>
+</context>
+<context>
+    <name>PluginModel</name>
+    <message>
+        <source>Name</source>
+        <translation>Имя</translation>
+    </message>
+    <message>
+        <source>Description</source>
+        <translation>Описание</translation>
+    </message>
+</context>
+<context>
     <name>Process</name>
     <message>
         <source>Process &apos;%1&apos; not finished</source>
