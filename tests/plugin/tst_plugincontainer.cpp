@@ -159,6 +159,7 @@ private Q_SLOTS:
     void dialogGeometry();
     void dialogOutlivesContainer();
     void elementsOfPlugins();
+    void examplePlugin();
 
 private:
     void watch(PluginContainer *container);
@@ -681,6 +682,28 @@ void PluginContainerTest::elementsOfPlugins()
     container->unloadPlugins();
     QCOMPARE(TreeString::fromTree(elements.rootNode()), QString());
     QCOMPARE(elements.treeNodeModel()->rowCount(), 0);
+}
+
+void PluginContainerTest::examplePlugin()
+{
+#ifndef KVT_EXAMPLE_PLUGIN_DIR
+    QSKIP("the examples are not built (KVT_BUILD_EXAMPLES is off)");
+#else
+    const QString directory = QStringLiteral(KVT_EXAMPLE_PLUGIN_DIR);
+    ElementContainer elements;
+    container->loadPlugins(directory);
+    elements.pluginContainerReset(container->rootNode());
+
+    QCOMPARE(acceptedCount(*container), 1);
+    QCOMPARE(container->pluginModel()->index(0, 0).data().toString(), QStringLiteral("Hello"));
+    QCOMPARE(TreeString::fromTree(container->rootNode()), QStringLiteral("hello"));
+    QCOMPARE(TreeString::fromTree(elements.rootNode()),
+             QStringLiteral("greeting_evening greeting_morning"));
+    QCOMPARE(elements.treeNodeModel()->index(1, 0).data(Qt::ToolTipRole).toString(),
+             QStringLiteral("Good morning!"));
+    container->unloadPlugins();
+    QCOMPARE(TreeString::fromTree(elements.rootNode()), QString());
+#endif
 }
 
 QTEST_MAIN(PluginContainerTest)
