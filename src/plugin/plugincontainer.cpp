@@ -11,6 +11,7 @@
 #include <QDirIterator>
 #include <QFileInfo>
 #include <QMessageBox>
+#include <QMetaMethod>
 #include <QPluginLoader>
 #include <QWidget>
 
@@ -19,6 +20,33 @@ namespace {
 // Why a loaded file was refused, kept on its loader: the loader itself
 // reports no error for a file that loaded well.
 const char refusalProperty[] = "_kvt_refusal";
+
+// The two module signals the container re-emits, looked up once. Connecting
+// by meta-method makes exactly the connections that the SIGNAL() form makes,
+// without parsing four signatures for every module of every plugin.
+struct RelayedSignals
+{
+    QMetaMethod moduleContent;
+    QMetaMethod moduleMenu;
+    QMetaMethod containerContent;
+    QMetaMethod containerMenu;
+};
+
+QMetaMethod signalOf(const QMetaObject &meta, const char *signature)
+{
+    return meta.method(meta.indexOfSignal(QMetaObject::normalizedSignature(signature).constData()));
+}
+
+const RelayedSignals &relayedSignals()
+{
+    static const RelayedSignals relayed = {
+        signalOf(Module::staticMetaObject, "contentElementWidgetChanged(int)"),
+        signalOf(Module::staticMetaObject, "customContextMenuRequested(QPoint)"),
+        signalOf(PluginContainer::staticMetaObject, "contentElementWidgetChanged(int)"),
+        signalOf(PluginContainer::staticMetaObject, "customContextMenuRequested(QPoint)"),
+    };
+    return relayed;
+}
 
 } // namespace
 
@@ -122,16 +150,17 @@ void PluginContainer::loadPlugin(const QString &filePath)
 
     // A copy: the plugin may change its list while events are processed.
     const QList<QObject *> objects = plugin->modules();
+    const RelayedSignals &relayed = relayedSignals();
     bool contributed = false;
     for (QObject *object : objects) {
         QCoreApplication::processEvents();
         auto *module = qobject_cast<Module *>(object);
         if (!module)
             continue;
-        connect(module, SIGNAL(contentElementWidgetChanged(int)),
-                this, SIGNAL(contentElementWidgetChanged(int)));
-        connect(module, SIGNAL(customContextMenuRequested(QPoint)),
-                this, SIGNAL(customContextMenuRequested(QPoint)));
+        // contentElementWidgetChanged(int) and customContextMenuRequested(QPoint)
+        // of the module to the container's signals of the same names.
+        connect(module, relayed.moduleContent, this, relayed.containerContent);
+        connect(module, relayed.moduleMenu, this, relayed.containerMenu);
         _modules.append(module);
         contributed = true;
     }

@@ -87,7 +87,16 @@ private:
             if (fileAnswer.isEmpty()) {
                 dialog->reject();
             } else {
-                dialog->selectFile(fileAnswer);
+                // Nothing typed and nothing selected: the dialog answers
+                // with the directory it shows, whatever its file list,
+                // filled in the background, holds by now.
+                dialog->setDirectory(fileAnswer);
+                if (auto *edit = dialog->findChild<QLineEdit *>(QStringLiteral("fileNameEdit")))
+                    edit->clear();
+                for (QAbstractItemView *view : dialog->findChildren<QAbstractItemView *>()) {
+                    if (view->selectionModel())
+                        view->selectionModel()->clear();
+                }
                 static_cast<QDialog *>(dialog)->accept();
             }
         }
