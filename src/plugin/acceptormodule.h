@@ -1,0 +1,28 @@
+#ifndef KVT_ACCEPTORMODULE_H
+#define KVT_ACCEPTORMODULE_H
+
+#include "module.h"
+
+/*!
+ * A module that works on elements another module owns: its donor, the
+ * module it hangs under in the module tree. The tree loader places it there
+ * by the expected depth and expected parent id given to the constructor.
+ *
+ * An acceptor module has no force reread mode: it shows no check box and
+ * keeps no settings.
+ */
+class KVTCOMMON_EXPORT AcceptorModule : public Module
+{
+    Q_OBJECT
+
+public:
+    AcceptorModule(const QString &name, int expectedDepth, const QString &expectedParentId,
+                   const QString &description, QObject *parent = nullptr);
+    ~AcceptorModule() override;
+
+    /*! The donor's element with the id \a name; null when there is none or
+     *  the module does not hang under another module. */
+    Element *elementFromDonor(const QString &name) const;
+};
+
+#endif // KVT_ACCEPTORMODULE_H

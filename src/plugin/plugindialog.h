@@ -1,0 +1,50 @@
+#ifndef KVT_PLUGINDIALOG_H
+#define KVT_PLUGINDIALOG_H
+
+#include "kvtcommon_export.h"
+
+#include <QDialog>
+
+class PluginContainer;
+
+namespace Ui {
+class PluginDialog;
+}
+
+/*!
+ * The window listing the plugin files a PluginContainer tried (with the
+ * modules of each accepted plugin) and the module tree, in two tabs. The
+ * plugin directory can be changed from here, which reloads the container.
+ *
+ * The dialog's geometry is kept in the application settings.
+ */
+class KVTCOMMON_EXPORT PluginDialog : public QDialog
+{
+    Q_OBJECT
+
+public:
+    explicit PluginDialog(PluginContainer *container, QWidget *parent = nullptr);
+    ~PluginDialog() override;
+
+    void loadSettings();
+    void saveSettings() const;
+
+public Q_SLOTS:
+    /*! Asks for another plugin directory and, when one other than the
+     *  current one is chosen, loads the plugins from it. */
+    void changePath();
+
+protected:
+    void showEvent(QShowEvent *event) override;
+
+private Q_SLOTS:
+    void forgetContainer();
+
+private:
+    void showPath();
+
+    Ui::PluginDialog *_ui;
+    PluginContainer *_pluginContainer;
+};
+
+#endif // KVT_PLUGINDIALOG_H

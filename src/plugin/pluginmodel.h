@@ -1,0 +1,55 @@
+#ifndef KVT_PLUGINMODEL_H
+#define KVT_PLUGINMODEL_H
+
+#include "kvtcommon_export.h"
+
+#include <QAbstractItemModel>
+
+class PluginContainer;
+
+/*!
+ * The plugin files of a PluginContainer and their modules, in two levels
+ * and two columns: every file tried on top (name and description of an
+ * accepted plugin, or the file name and why it was refused), the modules of
+ * each accepted plugin below it (id and description).
+ *
+ * Every load or unload of the container is one model reset.
+ *
+ * The internal pointer of an index is its parent object: null for a file,
+ * the Plugin for a module.
+ */
+class KVTCOMMON_EXPORT PluginModel : public QAbstractItemModel
+{
+    Q_OBJECT
+
+public:
+    explicit PluginModel(PluginContainer *container, QObject *parent = nullptr);
+    ~PluginModel() override;
+
+    QModelIndex index(int row, int column, const QModelIndex &parent = QModelIndex()) const override;
+    QModelIndex parent(const QModelIndex &index) const override;
+    int rowCount(const QModelIndex &parent = QModelIndex()) const override;
+    int columnCount(const QModelIndex &parent = QModelIndex()) const override;
+    QVariant data(const QModelIndex &index, int role = Qt::DisplayRole) const override;
+    QVariant headerData(int section, Qt::Orientation orientation,
+                        int role = Qt::DisplayRole) const override;
+
+    /*! The object of a row: the accepted Plugin or, for a refused file, its
+     *  QPluginLoader; a module row's object from the plugin's modules();
+     *  null for an invalid index. */
+    QObject *indexToObject(const QModelIndex &index) const;
+    /*! The index (column 0) of a top-level row's object, a Plugin or a
+     *  loader; invalid for anything else. */
+    QModelIndex ObjectToIndex(QObject *object) const;
+
+public Q_SLOTS:
+    void pluginContainerAboutToBeReset();
+    void pluginContainerReset();
+
+private:
+    int entryOf(const QObject *object) const;
+
+    PluginContainer *_pluginContainer;
+};
+
+#endif // KVT_PLUGINMODEL_H
