@@ -3,7 +3,7 @@
 #include "element.h"
 #include "elementroottreenode.h"
 #include "module.h"
-#include "treenodemodel.h"
+#include "elementmodel.h"
 
 #include <QPointer>
 #include <QVector>
@@ -15,7 +15,7 @@ ElementContainer::ElementContainer(QObject *parent)
     connect(_rootNode, SIGNAL(setCurrentNode(TreeNode *)), this, SIGNAL(setCurrentNode(TreeNode *)));
     connect(_rootNode, SIGNAL(expandCurrentNode(TreeNode *)),
             this, SIGNAL(expandCurrentNode(TreeNode *)));
-    _treeNodeModel = new TreeNodeModel(_rootNode, this);
+    _treeNodeModel = new ElementModel(_rootNode, this);
 }
 
 ElementContainer::~ElementContainer()

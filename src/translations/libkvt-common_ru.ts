@@ -64,7 +64,7 @@
     <name>ControlServiceTask</name>
     <message>
         <source>Failed to execute command &quot;%1 %2&quot;</source>
-        <translation>Не удалось выполнить команду "%1 %2"</translation>
+        <translation>Не удалось выполнить команду &quot;%1 %2&quot;</translation>
     </message>
 </context>
 <context>
@@ -97,7 +97,7 @@
     <message>
         <source>&quot;%1&quot; error %2
 %3</source>
-        <translation>"%1" ошибка %2
+        <translation>&quot;%1&quot; ошибка %2
 %3</translation>
     </message>
 </context>
@@ -214,6 +214,63 @@
     </message>
 </context>
 <context>
+    <name>PluginContainer</name>
+    <message>
+        <source>Plugin directory &apos;%1&apos; not exist.</source>
+        <translation>Каталог модулей расширения «%1» не существует.</translation>
+    </message>
+    <message>
+        <source>The plugin has no root object.</source>
+        <translation>У модуля расширения нет корневого объекта.</translation>
+    </message>
+    <message>
+        <source>The plugin does not implement the interface %1.</source>
+        <translation>Модуль расширения не реализует интерфейс %1.</translation>
+    </message>
+    <message>
+        <source>The plugin cannot work on this system.</source>
+        <translation>Модуль расширения не может работать в этой системе.</translation>
+    </message>
+</context>
+<context>
+    <name>PluginDialog</name>
+    <message>
+        <source>Plugins and modules</source>
+        <translation>Модули расширения и модули</translation>
+    </message>
+    <message>
+        <source>Plugin path:</source>
+        <translation>Путь к модулям расширения:</translation>
+    </message>
+    <message>
+        <source>Change</source>
+        <translation>Изменить</translation>
+    </message>
+    <message>
+        <source>Plugins</source>
+        <translation>Модули расширения</translation>
+    </message>
+    <message>
+        <source>Modules</source>
+        <translation>Модули</translation>
+    </message>
+    <message>
+        <source>Plugin directory</source>
+        <translation>Каталог модулей расширения</translation>
+    </message>
+</context>
+<context>
+    <name>PluginModel</name>
+    <message>
+        <source>Name</source>
+        <translation>Имя</translation>
+    </message>
+    <message>
+        <source>Description</source>
+        <translation>Описание</translation>
+    </message>
+</context>
+<context>
     <name>PreviewDialog</name>
     <message>
         <source>Print preview</source>
@@ -302,20 +359,20 @@
     <message>
         <source>Process: &quot;%1 %2&quot;. Error: %3.
 &quot;Not started&quot;</source>
-        <translation>Процесс: "%1 %2". Ошибка: %3.
-"Не запущен"</translation>
+        <translation>Процесс: &quot;%1 %2&quot;. Ошибка: %3.
+&quot;Не запущен&quot;</translation>
     </message>
     <message>
         <source>Process: &quot;%1 %2&quot;. Error: %3.
 &quot;Not finished&quot;</source>
-        <translation>Процесс: "%1 %2". Ошибка: %3.
-"Не завершён"</translation>
+        <translation>Процесс: &quot;%1 %2&quot;. Ошибка: %3.
+&quot;Не завершён&quot;</translation>
     </message>
     <message>
         <source>Process: &quot;%1 %2&quot;. Exit code: %3.
 &quot;%4&quot;</source>
-        <translation>Процесс: "%1 %2". Код завершения: %3.
-"%4"</translation>
+        <translation>Процесс: &quot;%1 %2&quot;. Код завершения: %3.
+&quot;%4&quot;</translation>
     </message>
 </context>
 <context>
