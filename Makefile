@@ -24,7 +24,7 @@ test: deps build
 	cd $(BUILD) && ctest --output-on-failure -j $(JOBS)
 
 demo: deps build
-	$(BUILD)/examples/confviewer/kvt-confviewer $(ARGS)
+	$(BUILD)/examples/host/kvt-demo-host $(ARGS)
 
 bench: deps build
 	sh scripts/run-benchmarks.sh $(BUILD)
