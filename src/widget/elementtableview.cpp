@@ -1,7 +1,5 @@
 #include "elementtableview.h"
 
-#include "element.h"
-#include "elementmodelextension.h"
 #include "elementviewhelper_p.h"
 
 #include <QHeaderView>
@@ -17,18 +15,12 @@ ElementTableView::~ElementTableView() = default;
 
 void ElementTableView::setModel(QAbstractItemModel *model)
 {
-    // The old selection model outlives the switch (the base view does not
-    // delete it), so its connection must be cut before it is replaced.
-    disconnectModel();
-    QTableView::setModel(model);
-    connectModel();
+    ElementViewHelper::setModel<QTableView>(this, model);
 }
 
 void ElementTableView::setSelectionModel(QItemSelectionModel *selectionModel)
 {
-    ElementViewHelper::disconnectSelectionModel(this, this->selectionModel());
-    QTableView::setSelectionModel(selectionModel);
-    ElementViewHelper::connectSelectionModel(this, this->selectionModel());
+    ElementViewHelper::setSelectionModel<QTableView>(this, selectionModel);
 }
 
 void ElementTableView::connectModel()
@@ -45,41 +37,21 @@ void ElementTableView::disconnectModel()
 
 void ElementTableView::emitCurrentElementChanged_Selection(const QItemSelection &selected)
 {
-    const QModelIndex index = ElementViewHelper::firstIndex(selected);
-    Q_EMIT currentElementChangedStructure(index);
-    // Without the focus the selection was made by the program (a search, a
-    // restored state): the operations offered to the user stay those of the
-    // widget that has the focus.
-    if (!hasFocus())
-        return;
-    if (const ElementModelExtension *elements = ElementViewHelper::elements(this))
-        Q_EMIT elementContextOperationChangedSelected(elements->toElement(index));
+    ElementViewHelper::emitSelectionChange(this, selected);
 }
 
 void ElementTableView::emitCurrentElementChanged_InsertRemove(const QModelIndex &parent)
 {
-    if (ElementViewHelper::selectionContains(selectionModel(), parent))
-        Q_EMIT currentElementChangedStructure(parent);
+    ElementViewHelper::emitInsertRemove(this, parent);
 }
 
-void ElementTableView::emitCurrentElementChanged_Changed(const QModelIndex &topLeft,
-                                                          const QModelIndex &bottomRight)
+void ElementTableView::emitCurrentElementChanged_Changed(const QModelIndex &topLeft, const QModelIndex &bottomRight)
 {
-    const QModelIndex index = ElementViewHelper::firstChangedSelected(selectionModel(), topLeft,
-                                                                      bottomRight);
-    if (!index.isValid())
-        return;
-    if (const ElementModelExtension *elements = ElementViewHelper::elements(this))
-        Q_EMIT elementContextOperationChangedChanged(elements->toElement(index));
+    ElementViewHelper::emitDataChange(this, topLeft, bottomRight);
 }
 
 void ElementTableView::focusInEvent(QFocusEvent *event)
 {
-    if (const ElementModelExtension *elements = ElementViewHelper::elements(this)) {
-        const QModelIndex index = selectionModel()
-            ? ElementViewHelper::firstIndex(selectionModel()->selection())
-            : QModelIndex();
-        Q_EMIT elementContextOperationChangedFocused(elements->toElement(index));
-    }
+    ElementViewHelper::emitFocusIn(this);
     QTableView::focusInEvent(event);
 }
