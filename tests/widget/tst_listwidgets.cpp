@@ -1,5 +1,4 @@
 #include <kvt-common/containerelement.h>
-#include <kvt-common/elementmodel.h>
 #include <kvt-common/elementselementwidget.h>
 #include <kvt-common/elementtreeview.h>
 #include <kvt-common/listwidgetproxymodel.h>
@@ -20,14 +19,8 @@
 namespace {
 
 // The listed container: "staff", of type "group", with a chosen number of columns.
-class ListRoot : public TestElement<ContainerElement>
-{
-public:
-    ListRoot(Module &module, int columns)
-        : TestElement<ContainerElement>(module, rightsYes, QStringLiteral("group"), QStringLiteral("staff"))
-        , columns(columns)
-    {
-    }
+struct ListRoot : TestElement<ContainerElement> {
+    ListRoot(Module &module, int columns) : TestElement(module, rightsYes, "group", "staff"), columns(columns) {}
     int columnCount() const override { return columns; }
     int columns;
 };
@@ -45,7 +38,12 @@ private Q_SLOTS:
     void filter_data();
     void filter();
     void liveTreeUnderFilter();
-    void choosingAndContextMenu_data();
+    void choosingAndContextMenu_data()
+    {
+        QTest::addColumn<bool>("nodes");
+        QTest::newRow("nodes") << true;
+        QTest::newRow("elements") << false;
+    }
     void choosingAndContextMenu();
     void settingsPerType();
 
@@ -69,10 +67,10 @@ private:
         auto *widget = new W(type, *module, rightsYes);
         module->insertElementWidget(widget);
         widget->setElement(root, EditElementRole);
-        widget->resize(400, 300);
-        widget->show();
         tester.reset(new QAbstractItemModelTester(widget->proxy(),
                                                   QAbstractItemModelTester::FailureReportingMode::QtTest));
+        widget->resize(400, 300);
+        widget->show();
         return widget;
     }
     static QString rows(const ListElementWidget *widget)
@@ -102,6 +100,9 @@ void ListWidgetsTest::cleanup()
 {
     tester.reset();
     module.reset();
+    // The line edit's clear button fades in by an animation that frees itself
+    // at the next animation tick once its button is gone.
+    QTest::qWait(50);
     QSettings().clear();
 }
 
@@ -114,14 +115,11 @@ void ListWidgetsTest::filter_data()
     // Column n of an element shows "<title>:<n>"; column 0 its title only.
     QTest::newRow("no filter: first level, no supplement") << 3 << 0 << "" << "Carol alice bob dave";
     QTest::newRow("wildcard, any case") << 3 << 0 << "C*L" << "Carol";
-    QTest::newRow("wildcard ?") << 3 << 0 << "b?b" << "bob";
-    QTest::newRow("regexp") << 3 << 1 << "^(a|b)" << "alice bob";
     QTest::newRow("regexp matching column 0 only") << 3 << 1 << "^alice$" << "";
     QTest::newRow("last column searched") << 3 << 1 << "e:2$" << "alice dave";
     QTest::newRow("invalid regexp") << 3 << 1 << "(a" << "Carol alice bob dave";
     QTest::newRow("regexp a.") << 3 << 1 << "a." << "Carol alice dave";
     QTest::newRow("fixed string a.") << 3 << 2 << "a." << "";
-    QTest::newRow("fixed string with brackets") << 3 << 2 << "[" << "";
     QTest::newRow("single column, no filter") << 1 << 0 << "" << "4 rows";
     QTest::newRow("single column, filter") << 1 << 2 << "a" << "0 rows";
 }
@@ -157,13 +155,6 @@ void ListWidgetsTest::liveTreeUnderFilter()
     patternEdit(widget)->clear();
     QCOMPARE(rows(widget), QStringLiteral("alice ivan karl olga otto"));
     QVERIFY(keepScreenshot(widget, QStringLiteral("elementselementwidget")));
-}
-
-void ListWidgetsTest::choosingAndContextMenu_data()
-{
-    QTest::addColumn<bool>("nodes");
-    QTest::newRow("nodes") << true;
-    QTest::newRow("elements") << false;
 }
 
 void ListWidgetsTest::choosingAndContextMenu()
@@ -211,8 +202,7 @@ void ListWidgetsTest::settingsPerType()
     type(group, 1, QStringLiteral("^[ab]"));
     QVERIFY(group->elementTreeView()->header()->isSortIndicatorShown());
     group->elementTreeView()->sortByColumn(1, Qt::DescendingOrder);
-    auto *never = new ElementsElementWidget(QStringLiteral("user"), *module, rightsYes);
-    delete never;
+    delete new ElementsElementWidget(QStringLiteral("user"), *module, rightsYes); // never shown
     delete group;
     QCOMPARE(settings.value("elementsElementWidget/groupFilterType").toInt(), 1);
     QCOMPARE(settings.value("elementsElementWidget/groupFilterValue").toString(), QStringLiteral("^[ab]"));
