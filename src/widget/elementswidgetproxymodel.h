@@ -1,0 +1,30 @@
+#ifndef KVT_ELEMENTSWIDGETPROXYMODEL_H
+#define KVT_ELEMENTSWIDGETPROXYMODEL_H
+
+#include "listwidgetproxymodel.h"
+
+/*!
+ * The proxy of ElementsElementWidget: lists the first level below the root,
+ * in every column but the first, and filters the rows by the proxy's filter
+ * expression.
+ *
+ * Column 0 (the node's own id) is neither shown nor searched: a row is
+ * listed when the expression is found in the display text of one of the
+ * columns 1 to n - 1. A source with a single column therefore lists no row
+ * at all once a valid, non-empty expression is set. An empty or invalid
+ * expression filters nothing.
+ */
+class KVTCOMMON_EXPORT ElementsWidgetProxyModel : public ListWidgetProxyModel
+{
+    Q_OBJECT
+
+public:
+    explicit ElementsWidgetProxyModel(int specialFlagsFilter, QObject *parent = nullptr);
+    ~ElementsWidgetProxyModel() override;
+
+protected:
+    bool filterAcceptsColumn(int sourceColumn, const QModelIndex &sourceParent) const override;
+    bool filterAcceptsRow(int sourceRow, const QModelIndex &sourceParent) const override;
+};
+
+#endif // KVT_ELEMENTSWIDGETPROXYMODEL_H

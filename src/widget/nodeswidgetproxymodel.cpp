@@ -1,0 +1,15 @@
+#include "nodeswidgetproxymodel.h"
+
+NodesWidgetProxyModel::NodesWidgetProxyModel(int specialFlagsFilter, QObject *parent)
+    : ListWidgetProxyModel(specialFlagsFilter, parent)
+{
+}
+
+NodesWidgetProxyModel::~NodesWidgetProxyModel() = default;
+
+bool NodesWidgetProxyModel::filterAcceptsRow(int sourceRow, const QModelIndex &sourceParent) const
+{
+    if (sourceParent.isValid())
+        return false;
+    return TreeNodeSortFilterProxyModel::filterAcceptsRow(sourceRow, sourceParent);
+}

@@ -1,0 +1,23 @@
+#ifndef KVT_NODESWIDGETPROXYMODEL_H
+#define KVT_NODESWIDGETPROXYMODEL_H
+
+#include "listwidgetproxymodel.h"
+
+/*!
+ * The proxy of NodesElementWidget: lists the first level below the root
+ * only, filtered by special flags as TreeNodeSortFilterProxyModel does. The
+ * text filter of the base is not applied.
+ */
+class KVTCOMMON_EXPORT NodesWidgetProxyModel : public ListWidgetProxyModel
+{
+    Q_OBJECT
+
+public:
+    explicit NodesWidgetProxyModel(int specialFlagsFilter, QObject *parent = nullptr);
+    ~NodesWidgetProxyModel() override;
+
+protected:
+    bool filterAcceptsRow(int sourceRow, const QModelIndex &sourceParent) const override;
+};
+
+#endif // KVT_NODESWIDGETPROXYMODEL_H
