@@ -89,6 +89,35 @@
     </message>
 </context>
 <context>
+    <name>ElementsElementWidget</name>
+    <message>
+        <source>Pattern type</source>
+        <translation>Тип шаблона</translation>
+    </message>
+    <message>
+        <source>Wildcard</source>
+        <translation>Шаблон с подстановкой</translation>
+    </message>
+    <message>
+        <source>RegExp</source>
+        <comment>Regular expression</comment>
+        <translation>Регулярное выражение</translation>
+    </message>
+    <message>
+        <source>Fixed string</source>
+        <comment>Fixed String</comment>
+        <translation>Фиксированная строка</translation>
+    </message>
+    <message>
+        <source>Pattern</source>
+        <translation>Шаблон</translation>
+    </message>
+    <message>
+        <source>Filter</source>
+        <translation>Фильтр</translation>
+    </message>
+</context>
+<context>
     <name>ExportHtmlTask</name>
     <message>
         <source>Export to HTML</source>
