@@ -1,6 +1,7 @@
 #ifndef KVT_TEST_ELEMENTTREESTRING_H
 #define KVT_TEST_ELEMENTTREESTRING_H
 
+#include <kvt-common/elementmodel.h>
 #include <kvt-common/elementroottreenode.h>
 #include <kvt-common/ordinaryelement.h>
 
@@ -8,7 +9,11 @@
 #include "testtreenode.h"
 #include "treestring.h"
 
+#include <QAbstractItemModelTester>
 #include <QRegularExpression>
+
+#include <memory>
+#include <vector>
 
 // An element showing "<title>:<n>" in column n > 0, with chosen special flags.
 class ListedElement : public TestElement<OrdinaryElement>
@@ -34,12 +39,10 @@ public:
     int columns;
 };
 
-/*
- * Element trees in the notation of TreeString ("a[a1 a2] b"), each name being
- * "title[:type][@group][#flags]" for an element (type "user" by default) or
- * "~id[#flags]" for a plain node that is no element:
- * "staff@users[alice bob@admins] ~note s#1".
- */
+// Element trees in the notation of TreeString ("a[a1 a2] b"), each name being
+// "title[:type][@group][#flags]" for an element (type "user" by default) or
+// "~id[#flags]" for a plain node that is no element:
+// "staff@users[alice bob@admins] ~note s#1".
 namespace ElementTreeString {
 
 inline TreeNode *makeNode(Module &module, const QString &name)
@@ -98,5 +101,40 @@ inline TreeNode *find(const TreeNode *root, const QString &name)
 }
 
 } // namespace ElementTreeString
+
+// A described element tree in a module, shown by an element model; the model
+// and every proxy stacked on it are watched by QAbstractItemModelTester.
+struct ElementTree
+{
+    using Mode = QAbstractItemModelTester::FailureReportingMode;
+    explicit ElementTree(const QString &description, int columns = 1) : root(columns)
+    {
+        build(&root, description);
+        owned.emplace_back(new QAbstractItemModelTester(&model, Mode::QtTest));
+    }
+    ~ElementTree() { while (!owned.empty()) owned.pop_back(); } // the last proxy first
+    // Takes a model (proxy(): a proxy, over source) and watches it.
+    template <typename Model>
+    Model *own(Model *m)
+    {
+        owned.emplace_back(m);
+        owned.emplace_back(new QAbstractItemModelTester(m, Mode::QtTest));
+        return m;
+    }
+    template <typename Proxy>
+    Proxy *proxy(Proxy *p, QAbstractItemModel *source)
+    {
+        p->setSourceModel(source);
+        return own(p);
+    }
+    void build(TreeNode *parent, const QString &description) { ElementTreeString::build(module, parent, description); }
+    TreeNode *node(const QString &name) const { return ElementTreeString::find(&root, name); }
+    Element *element(const QString &name) const { return qobject_cast<Element *>(node(name)); }
+
+    RecordingModule module{QStringLiteral("users")};
+    ListedRoot root;
+    ElementModel model{&root};
+    std::vector<std::unique_ptr<QObject>> owned;
+};
 
 #endif

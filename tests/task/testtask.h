@@ -5,68 +5,50 @@
 
 #include <QAtomicInt>
 #include <QSemaphore>
-#include <QString>
 
-/*!
- * A task for tests. It may wait at a gate the test opens (a semaphore), ends
- * with a chosen status and message, and counts its runs, follow-ups and
- * destructions in counters the test owns. A stoppable gated task gives up
- * waiting when asked to stop and ends with a warning.
- */
+// A task for tests: it may wait at a gate the test opens, ends with a chosen
+// status and the message "<name> done", and counts its runs, follow-ups and
+// destructions in counters the test owns (if any). A stoppable task waiting
+// at its gate gives up when asked to stop and ends with a warning.
 class TestTask : public AbstractTask
 {
 public:
     struct Counters
     {
-        QAtomicInt runs;
-        QAtomicInt afterRuns;
-        QAtomicInt destroyed;
+        QAtomicInt runs, afterRuns, destroyed;
         QSemaphore started; // released when run() begins
     };
 
     TestTask(Counters *counters, const QString &name,
-             TaskDescription::TaskStatus outcome = TaskDescription::Success,
-             QSemaphore *gate = nullptr, bool stoppable = false)
-        : counters(counters)
-        , outcome(outcome)
-        , gate(gate)
+             TaskDescription::TaskStatus outcome = TaskDescription::Success, QSemaphore *gate = nullptr,
+             bool stoppable = false)
+        : counters(counters), outcome(outcome), gate(gate)
     {
         taskDescription().setDescription(name);
         if (stoppable)
             _taskSpecialFlags |= StoppableFlag;
     }
-
-    ~TestTask() override
-    {
-        if (counters)
-            counters->destroyed.ref();
-    }
+    ~TestTask() override { count(&Counters::destroyed); }
 
     void run() override
     {
-        if (counters) {
-            counters->runs.ref();
+        count(&Counters::runs);
+        if (counters)
             counters->started.release();
-        }
         bool stopped = false;
-        if (gate) {
-            while (!gate->tryAcquire(1, 5)) {
-                if (taskAboutToBeStopped()) {
-                    stopped = true;
-                    break;
-                }
-            }
-        }
+        while (gate && !stopped && !gate->tryAcquire(1, 5))
+            stopped = taskAboutToBeStopped();
         taskDescription().setStatus(stopped ? TaskDescription::Warning : outcome);
         taskDescription().setMessage(stopped ? QStringLiteral("stopped on request")
-                                             : QStringLiteral("%1 done").arg(taskDescription().description()));
+                                             : taskDescription().description() + QStringLiteral(" done"));
         AbstractTask::run();
     }
+    void afterRun() override { count(&Counters::afterRuns); }
 
-    void afterRun() override
+    void count(QAtomicInt Counters::*counter)
     {
         if (counters)
-            counters->afterRuns.ref();
+            (counters->*counter).ref();
     }
 
     Counters *counters;
