@@ -193,8 +193,11 @@ void TaskObserverDialog::showEvent(QShowEvent *event)
 {
     QDialog::showEvent(event);
     // Both buttons start disabled: nothing is selected in a newly shown list.
+    // The list page comes first too, also when the dialog was last closed with
+    // Escape while it showed a message.
     _ui->_taskTreeView->clearSelection();
     enableMoreButtonSelectChange(QModelIndex());
+    gotoTaskWidget();
 }
 
 void TaskObserverDialog::closeEvent(QCloseEvent *event)

@@ -130,6 +130,15 @@ void TaskObserverTest::dialogFollowsTasks()
     if (!problem)
         return;
     QCOMPARE(status(0), int(outcome));
+    if (slow) { // left with Escape on the message page, it reopens on the list
+        dialog()->doubleClick(model->index(0, 0));
+        QTest::keyClick(dialog(), Qt::Key_Escape);
+        QVERIFY(!dialog()->isVisible());
+        dialog()->open();
+        QCOMPARE(child<QStackedWidget>("_stackedWidget")->currentIndex(), 0);
+        QVERIFY(child<QPlainTextEdit>("_errorPlainTextEdit")->toPlainText().isEmpty());
+        return;
+    }
     buttonBox()->button(QDialogButtonBox::Close)->click();
     QVERIFY(!dialog()->isVisible());
     QCOMPARE(model->rowCount(), 0);
