@@ -10,42 +10,34 @@
 
 #include <utility>
 
-/*!
- * Wraps a library task: afterRun() first records how the task ended, as
- * "<status>: <message>" (status as a word), in a list the test owns, then
- * runs the library's afterRun().
- */
+// Wraps a library task: afterRun() first records how the task ended, as
+// "<status>: <message>" (status as a word), in a list the test owns, then
+// runs the library's afterRun().
 template <class Task>
 class Probe : public Task
 {
 public:
     template <class... Args>
-    Probe(QStringList *outcomes, Args &&...args)
-        : Task(std::forward<Args>(args)...)
-        , outcomes(outcomes)
+    Probe(QStringList *outcomes, Args &&...args) : Task(std::forward<Args>(args)...), outcomes(outcomes)
     {
     }
 
     void afterRun() override
     {
-        outcomes->append(describe(this->taskDescription()));
-        Task::afterRun();
-    }
-
-    static QString describe(const TaskDescription &description)
-    {
         static const char *const words[] = {"processing", "fail", "success", "warning", "stopping"};
-        const QString word = QLatin1String(words[qBound(0, int(description.status()), 4)]);
-        return description.message().isEmpty() ? word : word + QStringLiteral(": ") + description.message();
+        const TaskDescription &description = this->taskDescription();
+        QString outcome = QLatin1String(words[qBound(0, int(description.status()), 4)]);
+        if (!description.message().isEmpty())
+            outcome += QStringLiteral(": ") + description.message();
+        outcomes->append(outcome);
+        Task::afterRun();
     }
 
     QStringList *outcomes;
 };
 
-/*!
- * Worker threads for a test process, started once: the ring of workers
- * cannot start again once a Thread has been destroyed.
- */
+// Worker threads for a test process, started once: the ring of workers
+// cannot start again once a Thread has been destroyed.
 class Workers
 {
 public:
@@ -55,9 +47,8 @@ public:
         for (int i = 0; i < count; ++i) {
             threads.append(new Thread);
             threads.last()->start();
+            QTRY_VERIFY(threads.last()->threadIndex() >= 0);
         }
-        for (Thread *thread : qAsConst(threads))
-            QTRY_VERIFY(thread->threadIndex() >= 0);
     }
     void stop()
     {

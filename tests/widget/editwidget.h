@@ -8,12 +8,10 @@
 #include <QLineEdit>
 #include <QStringList>
 
-/*!
- * A content editor as a plugin writes one: a line edit for the "text" value
- * of the element's record. Empty text is not valid. Records the hooks the
- * framework calls, as "read(<element id>)", "update", "import(<text>)",
- * "beforeCreation".
- */
+// A content editor as a plugin writes one: a line edit for the "text" value
+// of the element's record. Empty text is not valid. Records the hooks the
+// framework calls, as "read(<element id>)", "update", "import(<text>)",
+// "beforeCreation", and every state it reports with contentChanged().
 class EditWidget : public ViewEditElementWidget
 {
     Q_OBJECT
@@ -21,11 +19,11 @@ class EditWidget : public ViewEditElementWidget
 public:
     EditWidget(Module &module, RightsPredicate rights, const QString &type = QStringLiteral("user"),
                QWidget *parent = nullptr)
-        : ViewEditElementWidget(module, rights, parent)
-        , edit(new QLineEdit(this))
+        : ViewEditElementWidget(module, rights, parent), edit(new QLineEdit(this))
     {
         _elementType = type;
         connect(edit, SIGNAL(textEdited(QString)), this, SLOT(changeContent()));
+        connect(this, SIGNAL(contentChanged(int)), this, SLOT(record(int)));
     }
 
     QString toolTipText() const override { return QStringLiteral("editor"); }
@@ -68,6 +66,10 @@ public:
 
     QLineEdit *edit;
     QStringList hooks;
+    QList<int> reported;
+
+private Q_SLOTS:
+    void record(int state) { reported.append(state); }
 };
 
 #endif

@@ -1,5 +1,4 @@
 #include <kvt-common/changedisplayelementdata.h>
-#include <kvt-common/containerelement.h>
 #include <kvt-common/elementroottreenode.h>
 #include <kvt-common/ordinaryelement.h>
 #include <kvt-common/supplementelement.h>
@@ -14,49 +13,31 @@
 #include <QtTest>
 #include <qtestspontaneevent.h>
 
-#include <algorithm>
 #include <memory>
 
 Q_DECLARE_METATYPE(ElementWidgetRole)
 
-using Container = TestElement<ContainerElement>;
 using Ordinary = TestElement<OrdinaryElement>;
 
 namespace {
 
-// A supplement (special flag 1) that may offer the change of display and
+// A supplement (not selectable) that offers the change of display and
 // records the display type it is asked for.
 class SwitchingSupplement : public TestElement<SupplementElement>
 {
 public:
-    SwitchingSupplement(Module &module, bool offersChangeDisplay)
+    explicit SwitchingSupplement(Module &module)
         : TestElement<SupplementElement>(module, rightsYes, QStringLiteral("extra"), QStringLiteral("x"))
-        , offersChangeDisplay(offersChangeDisplay)
     {
     }
-    quint64 availableOperations() const override
+    quint64 availableOperations() const override { return ChangeDisplayOperation; }
+    void performOperation(OperationType, ElementData *data, int) override
     {
-        return SupplementElement::availableOperations() | (offersChangeDisplay ? ChangeDisplayOperation : 0);
+        if (auto *display = dynamic_cast<ChangeDisplayElementData *>(data))
+            requested.append(display->displayType());
     }
-    void performOperation(OperationType type, ElementData *data, int flags) override
-    {
-        if (type == ChangeDisplayOperation) {
-            auto *display = dynamic_cast<ChangeDisplayElementData *>(data);
-            requested.append(display ? display->displayType() : -1);
-        }
-        SupplementElement::performOperation(type, data, flags);
-    }
-    bool offersChangeDisplay;
     QList<int> requested;
 };
-
-QList<int> states(const QSignalSpy &spy)
-{
-    QList<int> result;
-    for (const QList<QVariant> &arguments : spy)
-        result.append(arguments.value(0).toInt());
-    return result;
-}
 
 } // namespace
 
@@ -64,280 +45,185 @@ class ElementWidgetTest : public QObject
 {
     Q_OBJECT
 
-private Q_SLOTS:
-    void initTestCase() { qRegisterMetaType<Element *>(); }
-    void init();
-    void cleanup();
-
-    void setElement_data();
-    void setElement();
-    void readOnProgrammaticShowOnly();
-    void editing_data();
-    void editing();
-    void setTreeNodeCurrent_data();
-    void setTreeNodeCurrent();
-    void noSetTreeNodeCurrent();
-    void moduleKeepsOneWidgetPerType();
-
-private:
     std::unique_ptr<RecordingModule> module;
     ElementRootTreeNode *root = nullptr;
     Ordinary *alice = nullptr;
     Ordinary *bob = nullptr;
-    QList<ElementData *> received; // records handed to the module, owned here
 
-    EditWidget *newEditor(ContextOperation::RightsPredicate rights = rightsYes)
+    EditWidget *newEditor()
     {
-        auto *widget = new EditWidget(*module, rights);
+        auto *widget = new EditWidget(*module, rightsYes);
         module->insertElementWidget(widget);
         return widget;
     }
-};
 
-void ElementWidgetTest::init()
-{
-    module.reset(new RecordingModule(QStringLiteral("users")));
-    root = new ElementRootTreeNode(module.get());
-    alice = new Ordinary(*module, rightsYes, QStringLiteral("user"), QStringLiteral("alice"));
-    bob = new Ordinary(*module, rightsYes, QStringLiteral("user"), QStringLiteral("bob"));
-    root->append(QList<TreeNode *>{alice, bob});
-    module->log.clear();
-    module->onOperation = [this](ContextOperation *, OperationType, ElementData *data) {
-        if (data)
-            received.append(data);
-    };
-}
+private Q_SLOTS:
+    void init()
+    {
+        module.reset(new RecordingModule(QStringLiteral("users")));
+        root = new ElementRootTreeNode(module.get());
+        alice = new Ordinary(*module, rightsYes, QStringLiteral("user"), QStringLiteral("alice"));
+        bob = new Ordinary(*module, rightsYes, QStringLiteral("user"), QStringLiteral("bob"));
+        root->append(QList<TreeNode *>{alice, bob});
+        module->log.clear();
+    }
+    void cleanup()
+    {
+        // Tree nodes do not own their children.
+        if (module)
+            root->clearDeleteAll();
+        module.reset();
+    }
 
-void ElementWidgetTest::cleanup()
-{
-    // Tree nodes do not own their children.
-    if (module)
-        root->clearDeleteAll();
-    module.reset();
-    qDeleteAll(received);
-    received.clear();
-}
+    void editing_data()
+    {
+        // After some text typed, e, c, n: shows alice to edit, alice to create, nothing;
+        // t:<text> types, i:<text> imports, u sets unchanged.
+        QTest::addColumn<QString>("steps");
+        QTest::addColumn<QList<int>>("reported");
+        QTest::addColumn<bool>("changed");
+        QTest::addColumn<bool>("blocked");
 
-void ElementWidgetTest::setElement_data()
-{
-    QTest::addColumn<bool>("mayEdit");
-    QTest::addColumn<ElementWidgetRole>("role");
-    QTest::addColumn<int>("times");
-    QTest::addColumn<bool>("enabled");
-    QTest::addColumn<QList<int>>("reported");
+        // Editing waits for a read; creating starts at once, invalid but unchanged.
+        QTest::newRow("edit") << "e" << QList<int>{} << false << true;
+        QTest::newRow("create twice resets once") << "c c" << QList<int>{2} << false << false;
+        QTest::newRow("element taken away") << "c n" << QList<int>{2} << false << true;
+        QTest::newRow("invalid edit") << "e t:" << QList<int>{2} << true << true;
+        QTest::newRow("edit then unchanged") << "e t:x u" << QList<int>{3, 0} << false << true;
+        QTest::newRow("import counts as change") << "e i:y" << QList<int>{3} << true << true;
+        QTest::newRow("create: unchanged reports anyway") << "c u u" << QList<int>{2, 0, 0} << false << false;
+    }
+    void editing()
+    {
+        QFETCH(QString, steps);
+        QFETCH(QList<int>, reported);
+        QFETCH(bool, changed);
+        QFETCH(bool, blocked);
 
-    // Editing waits for a read; creating starts at once, changed and invalid.
-    QTest::newRow("edit") << true << EditElementRole << 1 << false << QList<int>{};
-    QTest::newRow("edit without rights") << false << EditElementRole << 1 << false << QList<int>{};
-    QTest::newRow("create") << true << CreateElementRole << 1 << true << QList<int>{2};
-    QTest::newRow("create without rights") << false << CreateElementRole << 1 << true << QList<int>{2};
-    QTest::newRow("create twice resets once") << true << CreateElementRole << 2 << true << QList<int>{2};
-}
-
-void ElementWidgetTest::setElement()
-{
-    QFETCH(bool, mayEdit);
-    QFETCH(ElementWidgetRole, role);
-    QFETCH(int, times);
-    QFETCH(bool, enabled);
-    QFETCH(QList<int>, reported);
-
-    EditWidget *editor = newEditor(mayEdit ? rightsYes : rightsNo);
-    editor->userTypes(QStringLiteral("draft"));
-    QSignalSpy spy(editor, SIGNAL(contentChanged(int)));
-    for (int i = 0; i < times; ++i)
-        editor->setElement(alice, role);
-    QCOMPARE(editor->element(), alice);
-    QCOMPARE(editor->role(), role);
-    QCOMPARE(editor->isEnabled(), enabled);
-    QCOMPARE(editor->isEditBlocked(), !enabled);
-    QVERIFY(!editor->isChanged());
-    QCOMPARE(states(spy), reported);
-
-    // Taking the element away blocks the controls again, but reports nothing.
-    spy.clear();
-    editor->setElement(nullptr, NoElementRole);
-    QVERIFY(!editor->isEnabled());
-    QVERIFY(editor->isEditBlocked());
-    QCOMPARE(states(spy), QList<int>{});
-    QVERIFY(module->log.isEmpty());
-}
-
-void ElementWidgetTest::readOnProgrammaticShowOnly()
-{
-    EditWidget *editor = newEditor();
-    editor->setElement(alice, EditElementRole);
-
-    QShowEvent restored;
-    QSpontaneKeyEvent::setSpontaneous(&restored);
-    // Delivered as the window system does: sendEvent() would clear the flag.
-    qApp->notify(editor, &restored);
-    QCOMPARE(module->log, QStringList{});
-
-    editor->show();
-    QCOMPARE(module->log, QStringList{"ReadProperty(user_alice)"});
-    editor->hide();
-    editor->show();
-    QCOMPARE(module->log, (QStringList{"ReadProperty(user_alice)", "ReadProperty(user_alice)"}));
-    editor->hide();
-
-    // Nothing to read in the create role, nor for an element that does not
-    // offer reading.
-    auto *container = new Container(*module, rightsYes, QStringLiteral("user"), QStringLiteral("c"));
-    root->append(container);
-    module->log.clear();
-    editor->setElement(alice, CreateElementRole);
-    editor->show();
-    editor->hide();
-    editor->setElement(container, EditElementRole);
-    editor->show();
-    QCOMPARE(module->log, QStringList{});
-}
-
-void ElementWidgetTest::editing_data()
-{
-    QTest::addColumn<ElementWidgetRole>("role");
-    QTest::addColumn<QString>("steps");
-    QTest::addColumn<QList<int>>("reported");
-    QTest::addColumn<bool>("changed");
-
-    // Steps: t<text> types, i<text> imports, u sets unchanged.
-    QTest::newRow("valid edit") << EditElementRole << "t:x" << QList<int>{3} << true;
-    QTest::newRow("invalid edit") << EditElementRole << "t:" << QList<int>{2} << true;
-    QTest::newRow("edit then unchanged") << EditElementRole << "t:x u" << QList<int>{3, 0} << false;
-    QTest::newRow("unchanged without edit") << EditElementRole << "u" << QList<int>{} << false;
-    QTest::newRow("import counts as change") << EditElementRole << "i:y" << QList<int>{3} << true;
-    QTest::newRow("create: unchanged reports anyway") << CreateElementRole << "u u" << QList<int>{0, 0} << false;
-    QTest::newRow("create: valid edit") << CreateElementRole << "t:x" << QList<int>{3} << true;
-}
-
-void ElementWidgetTest::editing()
-{
-    QFETCH(ElementWidgetRole, role);
-    QFETCH(QString, steps);
-    QFETCH(QList<int>, reported);
-    QFETCH(bool, changed);
-
-    EditWidget *editor = newEditor();
-    editor->setElement(alice, role);
-    QSignalSpy spy(editor, SIGNAL(contentChanged(int)));
-    for (const QString &step : steps.split(QLatin1Char(' '))) {
-        const QString text = step.mid(2);
-        if (step.startsWith(QLatin1Char('t'))) {
-            editor->userTypes(text);
-        } else if (step.startsWith(QLatin1Char('i'))) {
-            ElementData imported;
-            imported.insert(QStringLiteral("text"), text);
-            editor->afterSuccessfulImport(&imported);
-        } else {
-            editor->setUnchanged();
+        EditWidget *editor = newEditor();
+        editor->userTypes(QStringLiteral("before"));
+        editor->reported.clear();
+        for (const QString &step : steps.split(QLatin1Char(' '))) {
+            if (step == QLatin1String("e")) {
+                editor->setElement(alice, EditElementRole);
+            } else if (step == QLatin1String("c")) {
+                editor->setElement(alice, CreateElementRole);
+            } else if (step == QLatin1String("n")) {
+                editor->setElement(nullptr, NoElementRole);
+            } else if (step == QLatin1String("u")) {
+                editor->setUnchanged();
+            } else if (step.startsWith(QLatin1Char('t'))) {
+                editor->userTypes(step.mid(2));
+            } else {
+                ElementData imported;
+                imported.insert(QStringLiteral("text"), step.mid(2));
+                editor->afterSuccessfulImport(&imported);
+            }
         }
+        QCOMPARE(editor->reported, reported);
+        QCOMPARE(editor->isChanged(), changed);
+        QCOMPARE(editor->isEditBlocked(), blocked);
+        QCOMPARE(editor->isEnabled(), !blocked);
+        QCOMPARE(module->log, QStringList{});
     }
-    QCOMPARE(states(spy), reported);
-    QCOMPARE(editor->isChanged(), changed);
-}
 
-void ElementWidgetTest::setTreeNodeCurrent_data()
-{
-    QTest::addColumn<QString>("target");
-    QTest::addColumn<ElementWidgetRole>("role");
-    QTest::addColumn<bool>("edited");
-    QTest::addColumn<int>("answer");
-    QTest::addColumn<bool>("madeCurrent");
-    QTest::addColumn<QList<int>>("displayRequests");
-    QTest::addColumn<bool>("changedAfter");
-    QTest::addColumn<int>("questions");
+    void readOnProgrammaticShowOnly()
+    {
+        EditWidget *editor = newEditor();
+        editor->setElement(alice, EditElementRole);
+        QShowEvent restored;
+        QSpontaneKeyEvent::setSpontaneous(&restored);
+        // Delivered as the window system does: sendEvent() would clear the flag.
+        qApp->notify(editor, &restored);
+        QCOMPARE(module->log, QStringList{});
+        editor->show();
+        editor->hide();
+        QCOMPARE(module->log, QStringList{"ReadProperty(user_alice)"});
 
-    const int none = QMessageBox::NoButton;
-    QTest::newRow("plain node") << "node" << EditElementRole << false << none << false << QList<int>{} << false << 0;
-    QTest::newRow("element") << "bob" << EditElementRole << false << none << true << QList<int>{} << false << 0;
-    QTest::newRow("supplement, no display change") << "supplement" << EditElementRole << false << none << false
-                                                    << QList<int>{} << false << 0;
-    QTest::newRow("supplement, display change") << "switching" << EditElementRole << false << none << true
-                                                 << QList<int>{0} << false << 0;
-    QTest::newRow("changed, answer no") << "bob" << EditElementRole << true << int(QMessageBox::No) << false
-                                        << QList<int>{} << true << 1;
-    // Going on keeps the edit flagged: it has still not been saved.
-    QTest::newRow("changed, answer yes") << "bob" << EditElementRole << true << int(QMessageBox::Yes) << true
-                                         << QList<int>{} << true << 1;
-    QTest::newRow("creating, answer yes") << "bob" << CreateElementRole << true << int(QMessageBox::Yes) << true
-                                          << QList<int>{} << false << 1;
-}
-
-void ElementWidgetTest::setTreeNodeCurrent()
-{
-    QFETCH(QString, target);
-    QFETCH(ElementWidgetRole, role);
-    QFETCH(bool, edited);
-    QFETCH(int, answer);
-    QFETCH(bool, madeCurrent);
-    QFETCH(QList<int>, displayRequests);
-    QFETCH(bool, changedAfter);
-    QFETCH(int, questions);
-
-    auto *plain = new SwitchingSupplement(*module, false);
-    auto *switching = new SwitchingSupplement(*module, true);
-    alice->append(QList<TreeNode *>{plain, switching});
-    TestTreeNode node(QStringLiteral("node"));
-    TreeNode *targetNode = target == QLatin1String("node") ? static_cast<TreeNode *>(&node)
-        : target == QLatin1String("bob")                   ? bob
-        : target == QLatin1String("supplement")            ? static_cast<TreeNode *>(plain)
-                                                           : switching;
-
-    EditWidget *editor = newEditor();
-    editor->setElement(alice, role);
-    if (edited)
-        editor->userTypes(QStringLiteral("unsaved"));
-    QSignalSpy current(targetNode, SIGNAL(setCurrentNode(TreeNode *)));
-    DialogAnswerer answerer;
-    answerer.answer(QMessageBox::StandardButton(answer));
-    editor->setTreeNodeCurrent(targetNode);
-
-    QCOMPARE(current.count(), madeCurrent ? 1 : 0);
-    QCOMPARE(switching->requested, target == QLatin1String("switching") ? displayRequests : QList<int>{});
-    QVERIFY(plain->requested.isEmpty());
-    QCOMPARE(editor->isChanged(), changedAfter);
-    QCOMPARE(answerer.seen.size(), questions);
-    if (questions) {
-        QCOMPARE(answerer.seen.first(),
-                 QStringLiteral("Element activation|Changes not saved!\nContinue without saving?|%1")
-                     .arg(int(QMessageBox::Yes | QMessageBox::No)));
+        // Nothing to read in the create role.
+        editor->setElement(alice, CreateElementRole);
+        editor->show();
+        QCOMPARE(module->log, QStringList{"ReadProperty(user_alice)"});
     }
-}
 
-void ElementWidgetTest::noSetTreeNodeCurrent()
-{
-    EditWidget *editor = newEditor();
-    DialogAnswerer answerer;
-    editor->noSetTreeNodeCurrent();
-    QCOMPARE(answerer.seen, QStringList{QStringLiteral("Element activation|Activation of this element not supported!|%1")
-                                            .arg(int(QMessageBox::Ok))});
-}
+    void setTreeNodeCurrent_data()
+    {
+        QTest::addColumn<QString>("target");
+        QTest::addColumn<ElementWidgetRole>("role");
+        QTest::addColumn<int>("answer"); // to the question about unsaved text; none: nothing typed
+        QTest::addColumn<bool>("madeCurrent");
+        QTest::addColumn<bool>("changedAfter");
 
-void ElementWidgetTest::moduleKeepsOneWidgetPerType()
-{
-    module->insertElementWidget(nullptr);
+        const int none = QMessageBox::NoButton;
+        QTest::newRow("plain node") << "node" << EditElementRole << none << false << false;
+        QTest::newRow("element") << "bob" << EditElementRole << none << true << false;
+        QTest::newRow("supplement, no display change") << "supplement" << EditElementRole << none << false << false;
+        QTest::newRow("supplement, display change") << "switching" << EditElementRole << none << true << false;
+        QTest::newRow("changed, answer no") << "bob" << EditElementRole << int(QMessageBox::No) << false << true;
+        // Going on keeps the edit flagged: it has still not been saved.
+        QTest::newRow("changed, answer yes") << "bob" << EditElementRole << int(QMessageBox::Yes) << true << true;
+        QTest::newRow("creating, answer yes") << "bob" << CreateElementRole << int(QMessageBox::Yes) << true << false;
+    }
+    void setTreeNodeCurrent()
+    {
+        QFETCH(QString, target);
+        QFETCH(ElementWidgetRole, role);
+        QFETCH(int, answer);
+        QFETCH(bool, madeCurrent);
+        QFETCH(bool, changedAfter);
 
-    QPointer<EditWidget> first = new EditWidget(*module, rightsYes, QStringLiteral("user"));
-    QPointer<EditWidget> second = new EditWidget(*module, rightsYes, QStringLiteral("user"));
-    QPointer<EditWidget> undefined = new EditWidget(*module, rightsYes, ContextOperation::undefinedElementType);
-    QPointer<EditWidget> group = new EditWidget(*module, rightsYes, QStringLiteral("group"));
-    for (EditWidget *widget : {first.data(), second.data(), undefined.data(), group.data()})
-        module->insertElementWidget(widget);
-    QVERIFY(first && group);
-    QVERIFY(!second);
-    QVERIFY(!undefined);
-    QCOMPARE(module->elementWidget(QStringLiteral("user")), first.data());
-    QCOMPARE(alice->elementWidget(EditElementRole), first.data());
+        auto *plain = new TestElement<SupplementElement>(*module, rightsYes, QStringLiteral("extra"));
+        auto *switching = new SwitchingSupplement(*module);
+        alice->append(QList<TreeNode *>{plain, switching});
+        TestTreeNode node(QStringLiteral("node"));
+        const QMap<QString, TreeNode *> targets{
+            {"node", &node}, {"bob", bob}, {"supplement", plain}, {"switching", switching}};
 
-    // A widget deleted elsewhere is forgotten and not deleted again.
-    delete group;
-    QVERIFY(!module->elementWidget(QStringLiteral("group")));
+        EditWidget *editor = newEditor();
+        editor->setElement(alice, role);
+        if (answer != QMessageBox::NoButton)
+            editor->userTypes(QStringLiteral("unsaved"));
+        QSignalSpy current(targets.value(target), SIGNAL(setCurrentNode(TreeNode *)));
+        DialogAnswerer answerer;
+        answerer.answer(QMessageBox::StandardButton(answer));
+        editor->setTreeNodeCurrent(targets.value(target));
 
-    root->clearDeleteAll();
-    module.reset();
-    QVERIFY(!first);
-}
+        QCOMPARE(current.count(), madeCurrent ? 1 : 0);
+        QCOMPARE(switching->requested, target == QLatin1String("switching") ? QList<int>{0} : QList<int>{});
+        QCOMPARE(editor->isChanged(), changedAfter);
+        const QString question = QStringLiteral("Element activation|Changes not saved!\nContinue without saving?|%1")
+                                     .arg(int(QMessageBox::Yes | QMessageBox::No));
+        QCOMPARE(answerer.seen, answer != QMessageBox::NoButton ? QStringList{question} : QStringList{});
+    }
+
+    void noSetTreeNodeCurrent()
+    {
+        DialogAnswerer answerer;
+        newEditor()->noSetTreeNodeCurrent();
+        const QString warning = QStringLiteral("Element activation|Activation of this element not supported!|%1");
+        QCOMPARE(answerer.seen, QStringList{warning.arg(int(QMessageBox::Ok))});
+    }
+
+    void moduleKeepsOneWidgetPerType()
+    {
+        module->insertElementWidget(nullptr);
+        QPointer<EditWidget> first = new EditWidget(*module, rightsYes, QStringLiteral("user"));
+        QPointer<EditWidget> second = new EditWidget(*module, rightsYes, QStringLiteral("user"));
+        QPointer<EditWidget> undefined = new EditWidget(*module, rightsYes, ContextOperation::undefinedElementType);
+        QPointer<EditWidget> group = new EditWidget(*module, rightsYes, QStringLiteral("group"));
+        for (EditWidget *widget : {first.data(), second.data(), undefined.data(), group.data()})
+            module->insertElementWidget(widget);
+        QVERIFY(first && group && !second && !undefined);
+        QCOMPARE(alice->elementWidget(EditElementRole), first.data());
+
+        // A widget deleted elsewhere is forgotten and not deleted again.
+        delete group;
+        QVERIFY(!module->elementWidget(QStringLiteral("group")));
+        root->clearDeleteAll();
+        module.reset();
+        QVERIFY(!first);
+    }
+};
 
 QTEST_MAIN(ElementWidgetTest)
 #include "tst_elementwidget.moc"
