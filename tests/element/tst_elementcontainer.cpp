@@ -1,7 +1,6 @@
 #include <kvt-common/containerelement.h>
 #include <kvt-common/elementcontainer.h>
 #include <kvt-common/moduleroottreenode.h>
-#include <kvt-common/ordinaryelement.h>
 #include <kvt-common/treenodemodel.h>
 
 #include "recordingmodule.h"
@@ -16,30 +15,21 @@
 
 namespace {
 
-// Elements leave the tree in their own destructor, while they can still
-// describe themselves: views told of the removal may ask for a tool tip.
-template <class Kind>
-class Leaving : public TestElement<Kind>
+// An element as a plugin makes it, id "<type>_<title>": it offers
+// ResetOperation and hands it to its module, and leaves the tree in its own
+// destructor while it can still describe itself (views told of the removal
+// may ask for a tool tip).
+class Item : public TestElement<ContainerElement>
 {
 public:
-    Leaving(Module &module, const QString &type, const QString &title, int depth, const QString &parentId)
-        : TestElement<Kind>(module, rightsYes, type, title)
+    Item(RecordingModule &module, const QString &id, int depth, const QString &parentId = QString())
+        : TestElement<ContainerElement>(module, rightsYes, id.section('_', 0, 0), id.section('_', 1))
     {
-        this->setExpected(depth, parentId);
-        this->setParent(&module);
-        static_cast<RecordingModule &>(module).elementNodesRef().append(this);
+        setExpected(depth, parentId);
+        setParent(&module);
+        module.elementNodesRef().append(this);
     }
-    ~Leaving() override { this->reset(); }
-};
-
-using Item = Leaving<OrdinaryElement>;
-
-// A top-level group that wants to hear when the tree is built: it offers
-// ResetOperation and hands it to its module.
-class Group : public Leaving<ContainerElement>
-{
-public:
-    using Leaving<ContainerElement>::Leaving;
+    ~Item() override { reset(); }
     quint64 availableOperations() const override { return ContainerElement::availableOperations() | ResetOperation; }
     void performOperation(OperationType type, ElementData *data, int flags) override
     {
@@ -56,127 +46,107 @@ class ElementContainerTest : public QObject
 {
     Q_OBJECT
 
-private Q_SLOTS:
-    void initTestCase() { qRegisterMetaType<TreeNode *>(); }
-    void init();
-    void cleanup();
-
-    void gatherElements();
-    void requestsReachContainer_data();
-    void requestsReachContainer();
-    void modulesGoing();
-
-private:
     std::unique_ptr<ModuleRootTreeNode> modulesRoot;
     RecordingModule *users = nullptr;
     RecordingModule *groups = nullptr;
     std::unique_ptr<ElementContainer> container;
     std::unique_ptr<QAbstractItemModelTester> tester;
     SignalLog *modelLog = nullptr;
-};
 
-void ElementContainerTest::init()
-{
-    // Modules as a plugin container hangs them: users, groups below users,
-    // extras below groups (beyond the two levels gathered).
-    modulesRoot.reset(new ModuleRootTreeNode);
-    users = new RecordingModule(QStringLiteral("users"), modulesRoot.get());
-    groups = new RecordingModule(QStringLiteral("groups"), modulesRoot.get());
-    auto *extras = new RecordingModule(QStringLiteral("extras"), modulesRoot.get());
-    modulesRoot->append(users);
-    users->append(groups);
-    groups->append(extras);
+private Q_SLOTS:
+    void initTestCase() { qRegisterMetaType<TreeNode *>(); }
 
-    new Group(*users, QStringLiteral("user"), QStringLiteral("all"), 1, QString());
-    new Item(*users, QStringLiteral("user"), QStringLiteral("alice"), 2, QStringLiteral("user_all"));
-    new Item(*users, QStringLiteral("user"), QStringLiteral("guests"), 1, QString());
-    // A module hangs an element below another module's group.
-    new Item(*groups, QStringLiteral("group"), QStringLiteral("staff"), 2, QStringLiteral("user_all"));
-    new Group(*groups, QStringLiteral("group"), QStringLiteral("groups"), 1, QString());
-    new Group(*extras, QStringLiteral("extra"), QStringLiteral("hidden"), 1, QString());
+    void init()
+    {
+        // Modules as a plugin container hangs them: users, groups below users,
+        // extras below groups (beyond the two levels gathered).
+        modulesRoot.reset(new ModuleRootTreeNode);
+        users = new RecordingModule("users", modulesRoot.get());
+        groups = new RecordingModule("groups", modulesRoot.get());
+        auto *extras = new RecordingModule("extras", modulesRoot.get());
+        modulesRoot->append(users);
+        users->append(groups);
+        groups->append(extras);
+        new Item(*users, "user_all", 1);
+        new Item(*users, "user_alice", 2, "user_all");
+        new Item(*users, "user_guests", 1);
+        // A module hangs an element below another module's element.
+        new Item(*groups, "group_staff", 2, "user_all");
+        new Item(*groups, "group_groups", 1);
+        new Item(*extras, "extra_hidden", 1);
 
-    container.reset(new ElementContainer);
-    tester.reset(new QAbstractItemModelTester(container->treeNodeModel(),
-                                              QAbstractItemModelTester::FailureReportingMode::QtTest));
-    modelLog = new SignalLog(container.get());
-    modelLog->watchModel(container->treeNodeModel());
-}
-
-void ElementContainerTest::cleanup()
-{
-    tester.reset();
-    container.reset();
-    modulesRoot.reset();
-}
-
-void ElementContainerTest::gatherElements()
-{
-    for (int pass = 0; pass < 2; ++pass) {
-        users->log.clear();
-        groups->log.clear();
-
-        container->pluginContainerReset(modulesRoot.get());
-
-        // The same tree every time, reaching views as one reset.
-        QCOMPARE(TreeString::fromTree(container->rootNode()), fullTree);
-        QCOMPARE(TreeString::fromModel(container->treeNodeModel(), QModelIndex(), Qt::UserRole + 2), fullTree);
-        QCOMPARE(modelLog->take(), QStringList({"aboutToReset", "reset"}));
-        // Only top-level elements offering the reset get it, once each; the
-        // second one groups hears is handed down by users, as modules do.
-        QCOMPARE(users->log.filter("Reset("), QStringList({"Reset(user_all)"}));
-        QCOMPARE(groups->log.filter("Reset("), QStringList({"Reset(group_groups)", "Reset(user_all)"}));
+        container.reset(new ElementContainer);
+        tester.reset(new QAbstractItemModelTester(container->treeNodeModel(),
+                                                  QAbstractItemModelTester::FailureReportingMode::QtTest));
+        modelLog = new SignalLog(container.get());
+        modelLog->watchModel(container->treeNodeModel());
     }
 
-    // Without modules the tree stays as it is; only the model is reset.
-    users->log.clear();
-    container->pluginContainerReset(nullptr);
-    QCOMPARE(TreeString::fromTree(container->rootNode()), fullTree);
-    QCOMPARE(modelLog->take(), QStringList({"aboutToReset", "reset"}));
-    QVERIFY(users->log.isEmpty());
-}
+    void cleanup()
+    {
+        tester.reset();
+        container.reset();
+        modulesRoot.reset();
+    }
 
-void ElementContainerTest::requestsReachContainer_data()
-{
-    QTest::addColumn<QString>("path");
-    QTest::addColumn<bool>("expand");
+    void gatherElements()
+    {
+        for (int pass = 0; pass < 2; ++pass) {
+            users->log.clear();
+            groups->log.clear();
 
-    QTest::newRow("current, top level") << "user_guests" << false;
-    QTest::newRow("current, three levels down") << "user_all/user_alice/x_deep" << false;
-    QTest::newRow("expand, three levels down") << "user_all/user_alice/x_deep" << true;
-}
+            container->pluginContainerReset(modulesRoot.get());
 
-void ElementContainerTest::requestsReachContainer()
-{
-    QFETCH(QString, path);
-    QFETCH(bool, expand);
-    container->pluginContainerReset(modulesRoot.get());
-    auto *deep = new Item(*users, QStringLiteral("x"), QStringLiteral("deep"), -1, QString());
-    TreeString::find(container->rootNode(), QStringLiteral("user_all/user_alice"))->append(deep);
-    TreeNode *node = TreeString::find(container->rootNode(), path);
-    QSignalSpy current(container.get(), SIGNAL(setCurrentNode(TreeNode *)));
-    QSignalSpy expanded(container.get(), SIGNAL(expandCurrentNode(TreeNode *)));
+            // The same tree every time, reaching views as one reset.
+            QCOMPARE(TreeString::fromTree(container->rootNode()), fullTree);
+            QCOMPARE(TreeString::fromModel(container->treeNodeModel(), QModelIndex(), Qt::UserRole + 2), fullTree);
+            QCOMPARE(modelLog->take(), QStringList({"aboutToReset", "reset"}));
+            // Only top-level elements get the reset, once each; groups hears
+            // those of users too, handed down as modules do.
+            QCOMPARE(users->log.filter("Reset("), QStringList({"Reset(user_all)", "Reset(user_guests)"}));
+            QCOMPARE(groups->log.filter("Reset("),
+                     QStringList({"Reset(group_groups)", "Reset(user_all)", "Reset(user_guests)"}));
+        }
 
-    expand ? node->emitExpandCurrentNode() : node->emitSetCurrentNode();
+        // Without modules the tree stays as it is; only the model is reset.
+        users->log.clear();
+        container->pluginContainerReset(nullptr);
+        QCOMPARE(TreeString::fromTree(container->rootNode()), fullTree);
+        QCOMPARE(modelLog->take(), QStringList({"aboutToReset", "reset"}));
+        QVERIFY(users->log.isEmpty());
+    }
 
-    QSignalSpy &heard = expand ? expanded : current;
-    QCOMPARE(heard.count(), 1);
-    QCOMPARE(heard.at(0).at(0).value<TreeNode *>(), node);
-    QCOMPARE((expand ? current : expanded).count(), 0);
-}
+    void requestsReachContainer()
+    {
+        container->pluginContainerReset(modulesRoot.get());
+        TreeNode *alice = TreeString::find(container->rootNode(), "user_all/user_alice");
+        QSignalSpy current(container.get(), SIGNAL(setCurrentNode(TreeNode *)));
+        QSignalSpy expanded(container.get(), SIGNAL(expandCurrentNode(TreeNode *)));
 
-void ElementContainerTest::modulesGoing()
-{
-    container->pluginContainerReset(modulesRoot.get());
+        // Asked below the top level, each heard once from the container.
+        alice->emitSetCurrentNode();
+        alice->emitExpandCurrentNode();
 
-    // Unloading a plugin destroys its modules and their elements: the tree
-    // and the model follow, nothing dangles.
-    delete groups;
-    QCOMPARE(TreeString::fromTree(container->rootNode()), QStringLiteral("user_all[user_alice] user_guests"));
-    QCOMPARE(TreeString::fromModel(container->treeNodeModel(), QModelIndex(), Qt::UserRole + 2),
-             QStringLiteral("user_all[user_alice] user_guests"));
-    modulesRoot.reset();
-    QCOMPARE(container->treeNodeModel()->rowCount(), 0);
-}
+        QCOMPARE(current.count(), 1);
+        QCOMPARE(current.at(0).at(0).value<TreeNode *>(), alice);
+        QCOMPARE(expanded.count(), 1);
+        QCOMPARE(expanded.at(0).at(0).value<TreeNode *>(), alice);
+    }
+
+    void modulesGoing()
+    {
+        container->pluginContainerReset(modulesRoot.get());
+
+        // Unloading a plugin destroys its modules and their elements: the tree
+        // and the model follow, nothing dangles.
+        delete groups;
+        const QString left = QStringLiteral("user_all[user_alice] user_guests");
+        QCOMPARE(TreeString::fromTree(container->rootNode()), left);
+        QCOMPARE(TreeString::fromModel(container->treeNodeModel(), QModelIndex(), Qt::UserRole + 2), left);
+        modulesRoot.reset();
+        QCOMPARE(container->treeNodeModel()->rowCount(), 0);
+    }
+};
 
 QTEST_MAIN(ElementContainerTest)
 #include "tst_elementcontainer.moc"

@@ -7,20 +7,12 @@
 //                        "*" an object in modules() that is not a module
 
 #include <kvt-common/acceptormodule.h>
+#include <kvt-common/elementdata.h>
 #include <kvt-common/plugin.h>
 
-#include <kvt-common/elementdata.h>
-
-#include <QStringList>
-
 // A plain module with the force reread mode, directly below the module root.
-class TopModule : public Module
-{
-    Q_OBJECT
-
-public:
-    TopModule(const QString &id, QObject *parent)
-        : Module(id, parent, true)
+struct TopModule : Module {
+    TopModule(const QString &id, QObject *parent) : Module(id, parent, true)
     {
         _expectedDepth = 1;
         _moduleData->insert(QStringLiteral("description"), id + QStringLiteral(" module"));
@@ -39,18 +31,15 @@ public:
         _name = QStringLiteral(TEST_PLUGIN_NAME);
         _description = QStringLiteral("The plugin ") + _name;
         _availableOperationsClass = TEST_PLUGIN_MASK;
-        const QStringList entries =
-            QStringLiteral(TEST_PLUGIN_MODULES).split(QLatin1Char(','), Qt::SkipEmptyParts);
-        for (const QString &entry : entries) {
+        for (const QString &entry : QStringLiteral(TEST_PLUGIN_MODULES).split(QLatin1Char(','))) {
             const QString parentId = entry.section(QLatin1Char('/'), 0, -2);
             const QString id = entry.section(QLatin1Char('/'), -1);
-            if (entry == QLatin1String("*")) {
+            if (entry == QLatin1String("*"))
                 _modules.append(new QObject(this));
-            } else if (parentId.isEmpty()) {
+            else if (parentId.isEmpty())
                 _modules.append(new TopModule(id, this));
-            } else {
+            else
                 _modules.append(new AcceptorModule(id, 2, parentId, id + QStringLiteral(" module"), this));
-            }
         }
     }
 
