@@ -2,7 +2,6 @@
 #define KVT_TEST_SCREENSHOT_H
 
 #include <QDir>
-#include <QPixmap>
 #include <QWidget>
 
 // Keeps a picture of a widget under the build tree (screenshots/<name>.png)
@@ -10,10 +9,7 @@
 inline bool keepScreenshot(QWidget *widget, const QString &name)
 {
     const QString dir = QStringLiteral(KVT_SCREENSHOT_DIR);
-    if (!QDir().mkpath(dir))
-        return false;
-    const QPixmap picture = widget->grab();
-    return !picture.isNull() && picture.save(dir + QLatin1Char('/') + name + QStringLiteral(".png"));
+    return QDir().mkpath(dir) && widget->grab().save(dir + QLatin1Char('/') + name + QStringLiteral(".png"));
 }
 
 #endif
