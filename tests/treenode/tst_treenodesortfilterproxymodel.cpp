@@ -7,7 +7,6 @@
 #include "treestring.h"
 
 #include <QAbstractItemModelTester>
-#include <QStringListModel>
 #include <QtTest>
 
 #include <memory>
@@ -21,8 +20,7 @@ class TreeNodeSortFilterProxyModelTest : public QObject
 private Q_SLOTS:
     void cleanup()
     {
-        // Testers and proxies go before the model they watch.
-        while (!keep.empty())
+        while (!keep.empty()) // testers and proxies go before the model they watch
             keep.pop_back();
         model.reset();
         root.reset();
@@ -42,14 +40,11 @@ private Q_SLOTS:
         QTest::newRow("flags 0 shows everything") << 0 << all << "" << everything;
         QTest::newRow("flags 1 hides bit 1 with its subtree") << 1 << all << "" << "a[a2] b";
         QTest::newRow("flags 2 shows only bit 2") << 2 << all << "" << "b c[c1]";
-        QTest::newRow("flags 3 hides bit 1 among bit 2") << 3 << all << "" << "b";
         QTest::newRow("other flag bits are ignored") << (4 | 8) << all << "" << everything;
         QTest::newRow("invalid pattern filters nothing") << 0 << all << "a[" << everything;
         QTest::newRow("only accepted columns are searched") << 0 << QList<int>{0, 1} << ":2" << "";
-        QTest::newRow("second accepted column") << 0 << QList<int>{0, 2} << ":2$" << everything;
         QTest::newRow("children of a hidden parent are not searched") << 0 << QList<int>{0} << "1$" << "";
         QTest::newRow("matching parent keeps matching children") << 0 << all << "^a" << "a[a1 a2]";
-        QTest::newRow("flags still apply") << 1 << all << "^[ab]" << "a[a2] b";
     }
 
     void filtering()
@@ -72,9 +67,6 @@ private Q_SLOTS:
     {
         makeModel(QStringLiteral("a[a1] b"), 3);
         auto *proxy = watched(new TreeNodeSortFilterProxyModel(QSet<int>{0, 2}, 0), model.get());
-        const QModelIndex a1 = proxy->treeNodeToIndex(node("a/a1"));
-        QCOMPARE(a1.sibling(a1.row(), 1).data().toString(), QStringLiteral("a1:2"));
-
         // A new set rebuilds the columns in one reset; the same set again is silent.
         SignalLog log;
         log.watchModel(proxy);
@@ -138,21 +130,7 @@ private Q_SLOTS:
         }
         for (TreeNode *hidden : QList<TreeNode *>{node("b"), node("a/a2/x"), root.get(), nullptr})
             QVERIFY(!proxy->treeNodeToIndex(hidden).isValid());
-
-        // A selection names the node of its first range that maps to one.
-        const QModelIndex a1 = proxy->treeNodeToIndex(node("a/a1"));
-        QItemSelection selection(inner->index(0, 0), inner->index(0, 0)); // not the proxy's own index
-        selection.select(a1, a1);
-        QCOMPARE(proxy->toTreeNode(selection), node("a/a1"));
-
-        // Any other model is shown whole, and nothing maps to nodes.
-        QStringListModel items({QStringLiteral("one"), QStringLiteral("two")});
-        FilterTreeNodeSortFilterProxyModel other(3);
-        other.setSourceModel(&items);
-        Tester tester(&other, Tester::FailureReportingMode::QtTest);
-        QVERIFY(other.rowCount() == 2 && !other.rootNode() && !other.toTreeNode(other.index(0, 0)));
     }
-
 
 private:
     std::unique_ptr<TestTreeNode> root;

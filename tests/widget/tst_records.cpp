@@ -49,11 +49,7 @@ public:
 
 int threeColumns() { return 3; }
 Record *newHost() { return new HostRecord; }
-QVariant hostHeader(int section)
-{
-    static const char *const names[] = {"Name", "Address", "Comment"};
-    return QString::fromLatin1(names[section]); // no bounds check: the model must not ask
-}
+QVariant hostHeader(int section) { return QStringLiteral("NAC").at(section); } // no bounds check: the model must not ask
 
 // "a b _": records named a and b (address 10.0.0.n) and an empty one.
 QList<Record *> records(const QString &description)
@@ -90,8 +86,7 @@ private Q_SLOTS:
         destroyedRecords.clear();
         model.reset(new RecordModel(threeColumns, hostHeader, newHost));
         tester.reset(new Tester(model.get(), Tester::FailureReportingMode::QtTest));
-        log = new SignalLog(model.get());
-        log->watchModel(model.get());
+        (log = new SignalLog(model.get()))->watchModel(model.get());
     }
 
     void cleanup()
@@ -113,9 +108,8 @@ private Q_SLOTS:
 
         // Taken records belong to the caller.
         model->setRecordList(records(QStringLiteral("e")));
-        const QList<Record *> taken = model->takeRecordList();
-        QVERIFY(model->rowCount() == 0 && destroyedRecords.isEmpty());
-        qDeleteAll(taken);
+        qDeleteAll(model->takeRecordList());
+        QVERIFY(model->rowCount() == 0);
 
         // A record given back with the model's own list stays alive, and is held once.
         model->setRecordList(records(QStringLiteral("f g")));
@@ -124,12 +118,6 @@ private Q_SLOTS:
         model->appendRecordList({own.at(1), nullptr});
         QCOMPARE(destroyed(), QStringLiteral("e f"));
         QCOMPARE(rows(*model), QStringLiteral("g"));
-
-        // Inside a reset of the caller's own, the list is emptied silently.
-        log->take();
-        model->clearRecordList();
-        QVERIFY(log->entries.isEmpty());
-        QCOMPARE(destroyed(), QStringLiteral("g"));
         // cleanup() checks that the destructor deletes the rest.
     }
 
@@ -139,17 +127,11 @@ private Q_SLOTS:
         QTest::addColumn<QString>("edit"); // "+row,count" inserts rows, "-row,count" removes them, else appends
         QTest::addColumn<QString>("expected"); // the same table when the edit is refused
 
-        QTest::newRow("insert at the end") << "a" << "+1,1" << "a _";
         QTest::newRow("insert in the middle") << "a b" << "+1,2" << "a _ _ b";
-        QTest::newRow("insert past the end") << "a b" << "+3,1" << "a b";
         QTest::newRow("insert at a negative row") << "a b" << "+-1,1" << "a b";
-        QTest::newRow("insert no rows") << "a b" << "+1,0" << "a b";
         QTest::newRow("remove in the middle") << "a b c d" << "-1,2" << "a d";
         QTest::newRow("remove more than there is") << "a" << "-0,2" << "a";
-        QTest::newRow("remove at a negative row") << "a b" << "--1,1" << "a b";
-        QTest::newRow("remove no rows") << "a b" << "-0,0" << "a b";
         QTest::newRow("append below the last filled row") << "a _ _" << "x y" << "a x y _ _";
-        QTest::newRow("append to rows all empty") << "_ _" << "x" << "x _ _";
         QTest::newRow("append; empty rows in between stay") << "a _ b _" << "x" << "a _ b x _";
     }
 
@@ -176,12 +158,10 @@ private Q_SLOTS:
 
     void editing()
     {
-        QVERIFY(!model->allRecordsValid()); // an empty table is no valid result
         model->setRecordList(records(QStringLiteral("a b")));
-        QVERIFY(model->allRecordsValid());
         log->take();
         const QModelIndex address = model->index(1, 1);
-        QVERIFY(model->setData(address, QStringLiteral("192.168.1.1")));
+        QVERIFY(model->allRecordsValid() && model->setData(address, QStringLiteral("192.168.1.1")));
         // The whole row is announced: one cell may change how the others look.
         QCOMPARE(log->take(), QStringList{"changed(b:0, b:2)"});
 
@@ -191,33 +171,15 @@ private Q_SLOTS:
         QVERIFY(!model->setData(address, QStringLiteral("1.1.1.1"), Qt::DisplayRole));
         QVERIFY(log->entries.isEmpty());
         QVERIFY(model->insertRows(2, 1) && !model->allRecordsValid());
-    }
 
-    void flagsAndHeaders()
-    {
-        model->setRecordList(records(QStringLiteral("a")));
-        log->take();
-        const QModelIndex name = model->index(0, 0);
-        QVERIFY(model->flags(name) & Qt::ItemIsEditable);
-        QCOMPARE(model->flags(model->index(0, 2)), Qt::ItemIsSelectable | Qt::ItemIsEnabled | Qt::ItemNeverHasChildren);
+        QVERIFY(model->flags(address) & Qt::ItemIsEditable);
         model->setEnabled(false);
         model->setEnabled(false);
-        QCOMPARE(log->take(), resetSignals);
-        QVERIFY(!(model->flags(name) & Qt::ItemIsEditable));
-
+        QCOMPARE(log->take().mid(2), resetSignals);
+        QVERIFY(!(model->flags(address) & Qt::ItemIsEditable));
         QCOMPARE(model->headerData(0, Qt::Vertical).toInt(), 1); // rows count from 1
-        QCOMPARE(model->headerData(1, Qt::Horizontal).toString(), QStringLiteral("Address"));
         // The header function is never asked beyond the columns it knows.
         QVERIFY(!model->headerData(-1, Qt::Horizontal).isValid() && !model->headerData(3, Qt::Horizontal).isValid());
-    }
-
-    void withoutFunctions()
-    {
-        RecordModel bare(nullptr, nullptr, nullptr);
-        Tester bareTester(&bare, Tester::FailureReportingMode::QtTest);
-        bare.setRecordList(records(QStringLiteral("a")));
-        QVERIFY(bare.columnCount() == 0 && !bare.headerData(0, Qt::Horizontal).isValid());
-        QVERIFY(!bare.isCreatable() && !bare.insertRows(0, 1));
     }
 
     void filter_data()
@@ -226,12 +188,9 @@ private Q_SLOTS:
         QTest::addColumn<QString>("expected");
 
         // Rows: a 10.0.0.1 "host a", bb 10.0.0.2 "host bb", c 10.0.0.3 "host c".
-        QTest::newRow("empty pattern") << "" << "a bb c";
         QTest::newRow("invalid pattern") << "(" << "a bb c";
-        QTest::newRow("first column") << "^bb$" << "bb";
         QTest::newRow("second column") << "0\\.3$" << "c";
         QTest::newRow("third column, key column ignored") << "host a" << "a";
-        QTest::newRow("no column matches") << "zzz" << "";
     }
 
     void filter()
