@@ -227,15 +227,12 @@ private Q_SLOTS:
         QVERIFY(writeFile(file, "key = old\n"));
         QCOMPARE(QProcess::execute(QStringLiteral("/bin/sh"), {QStringLiteral("-c"), "cd \"$0\" || exit 1\n" + setup, _dir->path()}), 0);
 
-        std::unique_ptr<FakePrograms> fakes;
-        if (!fakeCp.isNull()) {
-            fakes.reset(new FakePrograms);
-            fakes->add(QStringLiteral("cp"), fakeCp);
-        }
+        FakePrograms fakes;
+        if (!fakeCp.isNull())
+            fakes.add(QStringLiteral("cp"), fakeCp);
         KeyValueHandler handler(QStringLiteral("key=new"));
         QString error = QStringLiteral("earlier");
         QVERIFY(!RegExpHandler::rewriteSystemConfigureFile(file, handler, error, true));
-        fakes.reset();
 
         // The message follows the earlier text on a line of its own.
         const QRegularExpression re(messagePattern.replace(0, 1, QStringLiteral("^earlier\n"))
