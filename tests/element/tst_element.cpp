@@ -75,8 +75,7 @@ private Q_SLOTS:
         const QString base = themeDir.path() + QStringLiteral("/kvt-test/");
         QVERIFY(QDir().mkpath(base + QStringLiteral("16x16")));
         QFile index(base + QStringLiteral("index.theme"));
-        QVERIFY(index.open(QIODevice::WriteOnly));
-        QVERIFY(index.write("[Icon Theme]\nDirectories=16x16\n[16x16]\nSize=16\nType=Fixed\n") > 0);
+        QVERIFY(index.open(QIODevice::WriteOnly) && index.write("[Icon Theme]\nDirectories=16x16\n[16x16]\nSize=16\nType=Fixed\n") > 0);
         index.close();
         QPixmap pixmap(16, 16);
         pixmap.fill(Qt::red);
@@ -98,40 +97,20 @@ private Q_SLOTS:
         QCOMPARE(log.take(), QStringList{"nodeDataChanged(user_a%1b)"});
         // Title and tool tip in column 0; title, type, own group type and id
         // in any column.
-        const QStringList texts{user.data(0, Qt::DisplayRole).toString(),
-                                user.data(0, Qt::ToolTipRole).toString(),
-                                user.data(3, Qt::UserRole + 4).toString(),
-                                user.data(3, Qt::UserRole + 5).toString(),
-                                user.data(3, Qt::UserRole + 6).toString(),
-                                user.data(3, Qt::UserRole + 2).toString()};
+        const QStringList texts{user.data(0, Qt::DisplayRole).toString(), user.data(0, Qt::ToolTipRole).toString(),
+                                user.data(3, Qt::UserRole + 4).toString(), user.data(3, Qt::UserRole + 5).toString(),
+                                user.data(3, Qt::UserRole + 6).toString(), user.data(3, Qt::UserRole + 2).toString()};
         QCOMPARE(texts, (QStringList{"a%1b", "tip:a%1b", "a%1b", "user", "Undefined", "user_a%1b"}));
         QCOMPARE(user.questionForRemove(), QStringLiteral("Do you really want to remove this element?"));
 
-        // A persistent element keeps its id and title.
-        user.setExpected(1, QString());
-        user.setTitle(QStringLiteral("alice"));
-        QCOMPARE(user.id(), QStringLiteral("user_a%1b"));
-        QCOMPARE(user.title(), QStringLiteral("a%1b"));
-        QVERIFY(log.take().isEmpty());
-    }
-
-    void groupElementType()
-    {
+        // The group type is inherited, through plain nodes too.
         Container group(*module, rightsYes, "group", "staff");
         TestTreeNode between(QStringLiteral("between"));
-        Container inner(*module, rightsYes, "group", "inner");
-        Ordinary leaf(*module, rightsYes, "user", "alice");
-        Ordinary own(*module, rightsYes, "user", "bob");
         group.setGroupType(QStringLiteral("users"));
-        own.setGroupType(QStringLiteral("admins"));
         group.append(&between);
-        between.append(&inner);
-        inner.append(QList<TreeNode *>{&leaf, &own});
-        // Inherited through any number of undefined elements and plain nodes.
-        QCOMPARE(leaf.groupElementType() + ' ' + own.groupElementType(), QStringLiteral("users admins"));
-        group.clear();
-        QCOMPARE(leaf.groupElementType(), QStringLiteral("Undefined"));
-        inner.clear();
+        between.append(&user);
+        QCOMPARE(user.groupElementType(), QStringLiteral("users"));
+        between.clear();
     }
 
     void treeChangesNotifyModules_data()
@@ -186,18 +165,8 @@ private Q_SLOTS:
         root.append(group);
         group->append(alice);
         module->log.clear();
-
-        // The module may still read the record of an element that goes.
-        group->setElementData(new ElementData);
-        group->elementData()->setName(QStringLiteral("staff data"));
-        QString seenName;
-        module->onOperation = [&seenName](ContextOperation *c, OperationType type, ElementData *) {
-            if (type == RemovedOperation && c->elementContext()->elementData())
-                seenName = c->elementContext()->elementData()->name();
-        };
         delete group;
         QCOMPARE(module->log, (QStringList{"Removed(group_staff)", "Removed(user_alice)"}));
-        QCOMPARE(seenName, QStringLiteral("staff data"));
 
         // Elements owned by their module outlive its destructor while they
         // are still in an element tree: their removal must not call into it.
@@ -206,16 +175,6 @@ private Q_SLOTS:
         module.reset();
         QVERIFY(!watch);
         QCOMPARE(root.childNodesCount(), 0);
-
-        // A module made later at the same address is a live one again.
-        module.reset(new RecordingModule(QStringLiteral("first")));
-        RecordingModule *place = module.release();
-        place->~RecordingModule();
-        module.reset(new (place) RecordingModule(QStringLiteral("again")));
-        Ordinary carol(*module, rightsYes, "user", "carol");
-        root.append(&carol);
-        QCOMPARE(module->log, QStringList{"Inserted(user_carol)"});
-        root.clear();
     }
 
     void operations_data()
@@ -228,15 +187,11 @@ private Q_SLOTS:
         QTest::addColumn<QStringList>("forwarded");
 
         const QStringList ordinary{"Create", "ReadProperty", "Update", "Delete"};
-        const QStringList supplement{"ReadProperty", "Update"};
-        const QStringList container{"Create", "ReadContent"};
-        QTest::newRow("container") << quint64(12) << quint64(8) << container;
+        QTest::newRow("container") << quint64(12) << quint64(8) << QStringList{"Create", "ReadContent"};
         QTest::newRow("ordinary") << quint64(228) << quint64(32) << ordinary;
         QTest::newRow("ordinary persistent") << quint64(96) << quint64(32) << ordinary;
-        QTest::newRow("ordinary under a switching parent") << quint64(228 | 2048) << quint64(32 | 2048)
-                                                           << ordinary;
-        QTest::newRow("supplement") << quint64(96) << quint64(32) << supplement;
-        QTest::newRow("supplement under a switching parent") << quint64(96) << quint64(32) << supplement;
+        QTest::newRow("ordinary under a switching parent") << quint64(228 | 2048) << quint64(32 | 2048) << ordinary;
+        QTest::newRow("supplement") << quint64(96) << quint64(32) << QStringList{"ReadProperty", "Update"};
         QTest::newRow("login") << quint64(393256) << quint64(393256)
                                << QStringList{"ReadContent", "ReadProperty", "LoginExtra1", "LoginExtra2"};
         QTest::newRow("service") << quint64(0) << quint64(0) << QStringList();
@@ -283,20 +238,13 @@ private Q_SLOTS:
         group.append(&child);
         SignalLog log;
         log.watchNode(&group);
-        ServiceLightElementData other;
-        other.insert(QStringLiteral("displayType"), 5); // a key is no display type
-        ChangeDisplayElementData icons(1), details(2);
+        ChangeDisplayElementData details(2);
 
-        // Another record, or none, changes nothing; a child hands the
-        // request to its parent.
-        group.performOperation(ChangeDisplayOperation, &other, 0);
-        child.performOperation(ChangeDisplayOperation, nullptr, 0);
-        QCOMPARE(child.displayChildrenVariant(), 0);
-        group.performOperation(ChangeDisplayOperation, &icons, 0);
-        QCOMPARE(child.displayChildrenVariant(), 1);
+        // A child hands the request to its parent, which tells the views; the
+        // module is not asked.
         child.performOperation(ChangeDisplayOperation, &details, 0);
-        QCOMPARE(group.displayChildrenVariant(), 2);
-        QCOMPARE(log.take(), (QStringList{"nodeChildsDataChanged(group_g)", "nodeChildsDataChanged(group_g)"}));
+        QCOMPARE(child.displayChildrenVariant(), 2);
+        QCOMPARE(log.take(), QStringList{"nodeChildsDataChanged(group_g)"});
         QVERIFY(module->log.filter("ChangeDisplay").isEmpty());
         group.clear();
     }
@@ -328,8 +276,7 @@ private Q_SLOTS:
         QAbstractItemModelTester tester(&model, QAbstractItemModelTester::FailureReportingMode::QtTest);
         for (int row = 0; row < 2; ++row)
             model.fetchMore(model.index(row, 0));
-        QCOMPARE(module->log, (QStringList{"ReadContent(group_staff)", "Inserted(user_alice)",
-                                           "Inserted(user_bob)"}));
+        QCOMPARE(module->log, (QStringList{"ReadContent(group_staff)", "Inserted(user_alice)", "Inserted(user_bob)"}));
         QCOMPARE(TreeString::fromModel(&model), QStringLiteral("staff[alice bob] l"));
         QVERIFY(!model.canFetchMore(model.index(0, 0)));
         root.clear();
@@ -338,14 +285,11 @@ private Q_SLOTS:
     void resetConteinerElementRereads()
     {
         Container group(*module, rightsYes, "group", "staff");
-        Ordinary other(*module, rightsYes, "user", "other");
         QPointer<Element> child = new Ordinary(*module, rightsYes, "user", "alice");
         QPointer<Element> grandChild = new Ordinary(*module, rightsYes, "user", "x");
-        TestTreeNode otherChild(QStringLiteral("kept"));
         group.append(child.data());
         child->append(grandChild.data());
-        other.append(&otherChild);
-        module->elementNodesRef() << &group << &other;
+        module->elementNodesRef() << &group;
         group.fetchMore();
         QVERIFY(!group.canFetchMore());
 
@@ -354,42 +298,31 @@ private Q_SLOTS:
         // The children's children are detached, not destroyed.
         QVERIFY(grandChild && !grandChild->parentNode());
         QVERIFY(group.canFetchMore());
-        QCOMPARE(other.childNodesCount(), 1);
         delete grandChild.data();
-        other.clear();
     }
 
     void serviceIcons_data()
     {
-        QTest::addColumn<QString>("textState");
-        QTest::addColumn<bool>("running");
+        QTest::addColumn<int>("running"); // -1: state not known yet
         QTest::addColumn<QString>("expectedIcon");
-
-        QTest::newRow("state unknown") << QString() << true << QString();
-        QTest::newRow("running") << "active" << true << "media-playback-start";
-        QTest::newRow("stopped") << "inactive" << false << "media-playback-stop";
-        QTest::newRow("default text") << "default" << false << "media-playback-stop";
+        QTest::newRow("state unknown") << -1 << QString();
+        QTest::newRow("running") << 1 << "media-playback-start";
+        QTest::newRow("stopped") << 0 << "media-playback-stop";
     }
 
     void serviceIcons()
     {
-        QFETCH(QString, textState);
-        QFETCH(bool, running);
+        QFETCH(int, running);
         QFETCH(QString, expectedIcon);
 
         Service service(*module, rightsYes, "service", "cron");
         auto *light = dynamic_cast<ServiceLightElementData *>(service.elementData());
         QVERIFY(light);
-        if (!textState.isEmpty())
-            light->setState(running, textState == "default" ? QString() : textState);
+        if (running >= 0)
+            light->setState(running, QStringLiteral("text"));
         const QIcon icon = service.data(0, Qt::DecorationRole).value<QIcon>();
         QCOMPARE(icon.name(), themePresent ? expectedIcon : QString());
         QCOMPARE(icon.isNull(), expectedIcon.isEmpty() || !themePresent);
-
-        // A record of another kind put in by a plugin shows the default icon.
-        delete service.elementData();
-        service.setElementData(new ElementData);
-        QVERIFY(service.data(0, Qt::DecorationRole).value<QIcon>().isNull());
     }
 
     void supplementLoginMixin_data()
@@ -398,13 +331,10 @@ private Q_SLOTS:
         QTest::addColumn<int>("flags");
         QTest::addColumn<int>("expected");
 
-        QTest::newRow("no element") << "none" << 4 << 4;
         QTest::newRow("parent not an element") << "root" << 0 << 0;
         // The flag says the supplement is not under a login.
         QTest::newRow("parent not a login, other flags") << "false" << 4 << 5;
-        QTest::newRow("parent without the key") << "nokey" << 0 << 1;
         QTest::newRow("parent is a login") << "true" << 0 << 0;
-        QTest::newRow("parent is a login, flag already set") << "true" << 1 << 1;
     }
 
     void supplementLoginMixin()
@@ -416,18 +346,10 @@ private Q_SLOTS:
         ElementRootTreeNode root;
         Login login(*module, rightsYes, "login", "l");
         Supplement extra(*module, rightsYes, "extra", "e");
-        QCOMPARE(extra.treeNodeSpecialFlags(), 1);
-        // A login starts out as none yet, for no user.
-        QCOMPARE(login.elementData()->keys(), (QStringList{"isLogin", "user"}));
         login.elementData()->insert(QStringLiteral("isLogin"), situation == "true");
-        if (situation == "nokey")
-            login.elementData()->remove(QStringLiteral("isLogin"));
         TreeNode *parent = situation == "root" ? static_cast<TreeNode *>(&root) : &login;
-        if (situation != "none")
-            parent->append(&extra);
-
-        const SupplementLoginMixin mixin(situation == "none" ? nullptr : &extra);
-        QCOMPARE(mixin.treeNodeSpecialFlags(flags), expected);
+        parent->append(&extra);
+        QCOMPARE(SupplementLoginMixin(&extra).treeNodeSpecialFlags(flags), expected);
         parent->clear();
     }
 };

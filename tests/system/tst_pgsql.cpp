@@ -22,9 +22,9 @@ std::unique_ptr<PgsqlCluster> cluster(const QString &line = QStringLiteral("15 m
 }
 
 // A fake su that logs its -c command, one per line, to "su-log", answers the
-// user list query with the file "users", fails for a statement naming
-// "fail" and answers any other with "DONE".
-void addFakeSu(FakePrograms &fakes, const QStringList &users)
+// user list query with the file "users" (users postgres and alice), fails for
+// a statement naming "fail" and answers any other with "DONE".
+void addFakeSu(FakePrograms &fakes)
 {
     fakes.add(QStringLiteral("su"),
               "dir=$(dirname \"$0\")\n"
@@ -32,8 +32,7 @@ void addFakeSu(FakePrograms &fakes, const QStringList &users)
               "printf '%s\\n' \"$3\" >> \"$dir/su-log\"\n"
               "case \"$3\" in *usename*) cat \"$dir/users\" ;; *fail*) echo 'psql: error: connection refused' >&2; exit 2 ;;\n"
               "*) echo DONE ;; esac\n");
-    writeFile(fakes.filePath(QStringLiteral("users")), " usename\n----------\n " + users.join(QStringLiteral("\n ")).toUtf8()
-                                             + QStringLiteral("\n(%1 rows)\n\n").arg(users.size()).toUtf8());
+    writeFile(fakes.filePath(QStringLiteral("users")), " usename\n----------\n  postgres  \n\n alice\n(2 rows)\n\n");
 }
 
 QString describe(const QList<PgsqlCluster *> &clusters)
@@ -44,23 +43,14 @@ QString describe(const QList<PgsqlCluster *> &clusters)
     return names.join(QLatin1Char(','));
 }
 
-// Records the signals of a PgsqlManagerAsync as readable strings.
-class AsyncLog : public QObject
+// Records the signals of a PgsqlManagerAsync in *entries as readable strings.
+void watch(PgsqlManagerAsync *manager, QStringList *entries)
 {
-    Q_OBJECT
-public:
-    explicit AsyncLog(PgsqlManagerAsync *manager)
-    {
-        connect(manager, SIGNAL(clustersReaded(const QList<PgsqlCluster *> &)), this,
-                SLOT(onClusters(const QList<PgsqlCluster *> &)));
-        connect(manager, SIGNAL(exceptionArise(const AppException &)), this, SLOT(onException(const AppException &)));
-    }
-    QStringList entries;
-
-public Q_SLOTS:
-    void onClusters(const QList<PgsqlCluster *> &clusters) { entries << "clustersReaded(" + describe(clusters) + ')'; }
-    void onException(const AppException &e) { entries << "exceptionArise(" + e.getText() + ')'; }
-};
+    QObject::connect(manager, &PgsqlManagerAsync::clustersReaded,
+                     [entries](const QList<PgsqlCluster *> &c) { *entries << "clustersReaded(" + describe(c) + ')'; });
+    QObject::connect(manager, &PgsqlManagerAsync::exceptionArise,
+                     [entries](const AppException &e) { *entries << "exceptionArise(" + e.getText() + ')'; });
+}
 
 } // namespace
 
@@ -69,268 +59,229 @@ class PgsqlTest : public QObject
     Q_OBJECT
 
 private Q_SLOTS:
-    void clusterLine_data();
-    void clusterLine();
-    void userList_data();
-    void userList();
-    void userStatements_data();
-    void userStatements();
-    void clusterControlAndPackage();
-    void readClusters_data();
-    void readClusters();
-    void asynchronousReadDestroyedWhileRunning();
-    void realCluster();
-};
+    void clusterLine_data()
+    {
+        QTest::addColumn<QString>("line");
+        QTest::addColumn<QString>("result"); // the fields joined by '|', or the exception's text
 
-void PgsqlTest::clusterLine_data()
-{
-    QTest::addColumn<QString>("line");
-    QTest::addColumn<QString>("result"); // the fields joined by '|', or the exception's text
-
-    QTest::newRow("runs of blanks and tabs")
-        << "  11  main \t 5432 online,recovery postgres /var/lib/postgresql/11/main   /var/log/pg.log \r"
-        << "11|main|5432|online,recovery|postgres|/var/lib/postgresql/11/main|/var/log/pg.log";
-    QTest::newRow("surplus field goes to the earliest group")
-        << "11 main extra 5432 online postgres /d /l" << "11 main|extra|5432|online|postgres|/d|/l";
-    QTest::newRow("port too large for an int") << "11 main 99999999999 online postgres /d /l" << "11|main|0|online|postgres|/d|/l";
-    QTest::newRow("six fields") << "11 main 5432 online postgres /d" << "Cluster info not valid '11 main 5432 online postgres /d'";
-}
-
-void PgsqlTest::clusterLine()
-{
-    QFETCH(QString, line);
-    QFETCH(QString, result);
-
-    std::unique_ptr<PgsqlCluster> c;
-    const QString message = thrown([&] { c = cluster(line); });
-    const QStringList fields = c ? QStringList{c->version(), c->name(), QString::number(c->port()), c->status(),
-                                               c->owner(), c->dataDirectory(), c->logFile()}
-                                 : QStringList();
-    QCOMPARE(c ? fields.join(QLatin1Char('|')) : message, result);
-}
-
-void PgsqlTest::userList_data()
-{
-    QTest::addColumn<QByteArray>("output");
-    QTest::addColumn<QString>("result"); // the names joined by ',', or the exception's text
-
-    const QString unmatched = QStringLiteral("SQL request '%1' not mathed").arg(userQuery);
-    QTest::newRow("two users, blank lines between") << QByteArray("usename\n-------\n  postgres  \n\n alice\n(2 rows)")
-                                                    << "postgres,alice";
-    QTest::newRow("zero rows") << QByteArray(" usename \n----------\n(0 rows)\n\n") << "";
-    QTest::newRow("count not checked") << QByteArray(" usename\n---\n a\n b\n c\n(1 row)\n") << "a,b,c";
-    QTest::newRow("no footer") << QByteArray(" usename\n---------\n postgres\n") << unmatched;
-}
-
-void PgsqlTest::userList()
-{
-    QFETCH(QByteArray, output);
-    QFETCH(QString, result);
-
-    FakePrograms fakes;
-    addFakeSu(fakes, {});
-    writeFile(fakes.filePath(QStringLiteral("users")), output);
-    QStringList names;
-    const QString message = thrown([&] { names = cluster()->usernames(); });
-    QCOMPARE(message.isNull() ? names.join(QLatin1Char(',')) : message, result);
-}
-
-void PgsqlTest::userStatements_data()
-{
-    QTest::addColumn<QString>("operation");
-    QTest::addColumn<QString>("text");
-    QTest::addColumn<QStringList>("statements"); // what reaches psql
-    QTest::addColumn<QString>("message");
-
-    const QString users = userQuery;
-    QTest::newRow("create existing") << "create" << "alice" << QStringList{users} << QString();
-    QTest::newRow("create new") << "create" << "bob" << QStringList{users, "create user bob;"} << QString();
-    QTest::newRow("delete existing") << "delete" << "alice" << QStringList{users, "drop user alice;"} << QString();
-    QTest::newRow("delete unknown") << "delete" << "bob" << QStringList{users} << QString();
-    const QString benign = QStringLiteral("SELECT 'a b', 1 % 2 FROM t WHERE x <> 'it''s';");
-    QTest::newRow("benign query reaches psql as written") << "sql" << benign << QStringList{benign} << QString();
-    QTest::newRow("psql fails") << "sql" << "SELECT fail;" << QStringList{"SELECT fail;"}
-                                << "Process 'su postgres -c psql -p 5433 -c \"SELECT fail;\"' execute with error code '2'. "
-                                   "psql: error: connection refused\n";
-
-    // Anything that could leave the shell quotes, or a name the server would fold, runs nothing.
-    for (const char *query : {"SELECT \"x\";", "SELECT 1;\\! id", "SELECT '$HOME';", "SELECT '`id`';", "SELECT 1;\nDROP ROLE x;"})
-        QTest::newRow(qPrintable(QStringLiteral("refused query ") + QString::fromLatin1(query).replace('\n', "\\n")))
-            << "sql" << query << QStringList()
-            << QStringLiteral("SQL request '%1' contains a character that cannot be passed to the shell").arg(query);
-    const QStringList names{"bob; drop user postgres", "bob\"; id; \"", "1bob", "Bob", "", QString(64, QLatin1Char('a'))};
-    for (const QString &name : names) {
-        for (const QString &operation : {QStringLiteral("create"), QStringLiteral("delete")})
-            QTest::newRow(qPrintable(QStringLiteral("refused %1 '%2'").arg(operation, name.left(20))))
-                << operation << name << QStringList() << QStringLiteral("User name '%1' is not a plain SQL identifier").arg(name);
+        QTest::newRow("runs of blanks and tabs")
+            << "  11  main \t 5432 online,recovery postgres /var/lib/postgresql/11/main   /var/log/pg.log \r"
+            << "11|main|5432|online,recovery|postgres|/var/lib/postgresql/11/main|/var/log/pg.log";
+        QTest::newRow("surplus field goes to the earliest group")
+            << "11 main extra 5432 online postgres /d /l" << "11 main|extra|5432|online|postgres|/d|/l";
+        QTest::newRow("six fields") << "11 main 5432 online postgres /d" << "Cluster info not valid '11 main 5432 online postgres /d'";
     }
-}
 
-void PgsqlTest::userStatements()
-{
-    QFETCH(QString, operation);
-    QFETCH(QString, text);
-    QFETCH(QStringList, statements);
-    QFETCH(QString, message);
+    void clusterLine()
+    {
+        QFETCH(QString, line);
+        QFETCH(QString, result);
 
-    FakePrograms fakes;
-    addFakeSu(fakes, {"postgres", "alice"});
-    const auto c = cluster();
-    QCOMPARE(thrown([&] {
-                 if (operation == QLatin1String("sql"))
-                     c->sqlRequest(text);
-                 else if (operation == QLatin1String("create"))
-                     c->createUser(text);
-                 else
-                     c->deleteUser(text);
-             }),
-             message);
-    QStringList expected;
-    for (const QString &statement : statements)
-        expected << QStringLiteral("psql -p 5433 -c \"%1\"").arg(statement);
-    const QString log = QString::fromUtf8(readFile(fakes.filePath(QStringLiteral("su-log"))));
-    QCOMPARE(log.split(QLatin1Char('\n'), Qt::SkipEmptyParts), expected);
-}
+        std::unique_ptr<PgsqlCluster> c;
+        const QString message = thrown([&] { c = cluster(line); });
+        const QStringList fields = c ? QStringList{c->version(), c->name(), QString::number(c->port()), c->status(),
+                                                   c->owner(), c->dataDirectory(), c->logFile()}
+                                     : QStringList();
+        QCOMPARE(c ? fields.join(QLatin1Char('|')) : message, result);
+    }
 
-void PgsqlTest::clusterControlAndPackage()
-{
-    FakePrograms fakes;
-    // Running clusters are those named in the file "running"; "start" of "broken" fails.
-    fakes.add(QStringLiteral("pg_ctlcluster"),
-              "dir=$(dirname \"$0\")\n"
-              "case \"$3\" in\n"
-              "status) grep -qx \"$1/$2\" \"$dir/running\" && exit 0; exit 3 ;;\n"
-              "start) [ \"$2\" = broken ] && { echo 'Error: could not start' >&2; exit 1; }\n"
-              "       echo \"$1/$2\" >> \"$dir/running\" ;;\n"
-              "esac\n");
-    writeFile(fakes.filePath(QStringLiteral("running")), "15/main\n");
-    const auto main = cluster(QStringLiteral("15 main 5432 online postgres /d /l"));
-    const auto dev = cluster(QStringLiteral("15 dev 5433 down postgres /d /l"));
-    const auto broken = cluster(QStringLiteral("13 broken 5434 down postgres /d /l"));
+    void userStatements_data()
+    {
+        QTest::addColumn<QString>("operation");
+        QTest::addColumn<QString>("text"); // for "users": the output of psql
+        QTest::addColumn<QStringList>("statements"); // what reaches psql
+        QTest::addColumn<QString>("message"); // for "users": the names joined by ',' unless it fails
 
-    QVERIFY(!PgsqlManager::allClustersWork({main.get(), dev.get()}));
-    dev->start();
-    QVERIFY(PgsqlManager::allClustersWork({main.get(), dev.get()}));
-    QCOMPARE(thrown([&] { broken->start(); }),
-             QStringLiteral("Process 'pg_ctlcluster 13 broken start' execute with error code '1'. Error: could not start\n"));
+        const QString users = userQuery;
+        QTest::newRow("user list, count not checked") << "users" << " usename\n---\n a\n b\n c\n(1 row)\n" << QStringList{users}
+                                                      << "a,b,c";
+        QTest::newRow("user list without footer") << "users" << " usename\n---------\n postgres\n" << QStringList{users}
+                                                  << QStringLiteral("SQL request '%1' not mathed").arg(userQuery);
+        QTest::newRow("create existing") << "create" << "alice" << QStringList{users} << QString();
+        QTest::newRow("create new") << "create" << "bob" << QStringList{users, "create user bob;"} << QString();
+        QTest::newRow("delete existing") << "delete" << "alice" << QStringList{users, "drop user alice;"} << QString();
+        const QString benign = QStringLiteral("SELECT 'a b', 1 % 2 FROM t WHERE x <> 'it''s';");
+        QTest::newRow("benign query reaches psql as written") << "sql" << benign << QStringList{benign} << QString();
+        QTest::newRow("psql fails") << "sql" << "SELECT fail;" << QStringList{"SELECT fail;"}
+                                    << "Process 'su postgres -c psql -p 5433 -c \"SELECT fail;\"' execute with error code '2'. "
+                                       "psql: error: connection refused\n";
 
-    // Only the versioned server package counts, not postgresql-common or a client.
-    fakes.add(QStringLiteral("dpkg-query"), "[ \"$3\" = 'postgresql-[0123456789]*' ] && echo 'install ok installed'");
-    QVERIFY(PgsqlManager().packagesInslled());
+        // Anything that could leave the shell quotes, or a name the server would fold, runs nothing.
+        for (const char *query : {"SELECT \"x\";", "SELECT 1;\\! id", "SELECT '$HOME';", "SELECT 1;\nDROP ROLE x;"})
+            QTest::newRow(qPrintable(QStringLiteral("refused query ") + QString::fromLatin1(query).replace('\n', "\\n")))
+                << "sql" << query << QStringList()
+                << QStringLiteral("SQL request '%1' contains a character that cannot be passed to the shell").arg(query);
+        const QStringList names{"bob; drop user postgres", "1bob", "Bob", QString(64, QLatin1Char('a'))};
+        for (const QString &name : names) {
+            for (const QString &operation : {QStringLiteral("create"), QStringLiteral("delete")})
+                QTest::newRow(qPrintable(QStringLiteral("refused %1 '%2'").arg(operation, name.left(20))))
+                    << operation << name << QStringList() << QStringLiteral("User name '%1' is not a plain SQL identifier").arg(name);
+        }
+    }
 
-    // A status that crashes is an error, not "not running".
-    fakes.add(QStringLiteral("pg_ctlcluster"), "kill -TERM $$");
-    QCOMPARE(thrown([&] { main->isWork(); }), QStringLiteral("Process 'pg_ctlcluster 15 main status' not finished"));
-}
+    void userStatements()
+    {
+        QFETCH(QString, operation);
+        QFETCH(QString, text);
+        QFETCH(QStringList, statements);
+        QFETCH(QString, message);
 
-void PgsqlTest::readClusters_data()
-{
-    QTest::addColumn<QString>("script"); // null: no pg_lsclusters at all
-    QTest::addColumn<QString>("clusters");
-    QTest::addColumn<QString>("message");
+        FakePrograms fakes;
+        addFakeSu(fakes);
+        if (operation == QLatin1String("users"))
+            writeFile(fakes.filePath(QStringLiteral("users")), text.toUtf8());
+        const auto c = cluster();
+        QString names;
+        QCOMPARE(thrown([&] {
+                     if (operation == QLatin1String("sql"))
+                         c->sqlRequest(text);
+                     else if (operation == QLatin1String("create"))
+                         c->createUser(text);
+                     else if (operation == QLatin1String("delete"))
+                         c->deleteUser(text);
+                     else
+                         names = c->usernames().join(QLatin1Char(','));
+                 }) + names,
+                 message);
+        QStringList expected;
+        for (const QString &statement : statements)
+            expected << QStringLiteral("psql -p 5433 -c \"%1\"").arg(statement);
+        const QString log = QString::fromUtf8(readFile(fakes.filePath(QStringLiteral("su-log"))));
+        QCOMPARE(log.split(QLatin1Char('\n'), Qt::SkipEmptyParts), expected);
+    }
 
-    QTest::newRow("two clusters, blank line skipped") << twoClusters << "11/main:5432,15/dev:5433" << QString();
-    QTest::newRow("zero rows") << "exit 0" << "" << QString();
-    QTest::newRow("malformed second line keeps the first")
-        << "printf '11 main 5432 online postgres /a /b\\nbroken line\\n15 dev 5433 down postgres /c /d\\n'"
-        << "11/main:5432" << "Cluster info not valid 'broken line'";
-    QTest::newRow("tool fails") << "echo 'Error: no permission' >&2; exit 1" << ""
-                                << "Process 'pg_lsclusters --no-header' execute with error code '1'. Error: no permission\n";
-    QTest::newRow("tool missing") << QString() << "" << "Process 'pg_lsclusters --no-header' not finished";
-}
+    void clusterControlAndPackage()
+    {
+        FakePrograms fakes;
+        // Running clusters are those named in the file "running".
+        fakes.add(QStringLiteral("pg_ctlcluster"), "dir=$(dirname \"$0\")\ncase \"$3\" in\n"
+                  "status) grep -qx \"$1/$2\" \"$dir/running\" && exit 0; exit 3 ;;\n"
+                  "start) echo \"$1/$2\" >> \"$dir/running\" ;;\nesac\n");
+        writeFile(fakes.filePath(QStringLiteral("running")), "15/main\n");
+        const auto main = cluster(QStringLiteral("15 main 5432 online postgres /d /l"));
+        const auto dev = cluster(QStringLiteral("15 dev 5433 down postgres /d /l"));
 
-void PgsqlTest::readClusters()
-{
-    QFETCH(QString, script);
-    QFETCH(QString, clusters);
-    QFETCH(QString, message);
+        QVERIFY(!PgsqlManager::allClustersWork({main.get(), dev.get()}));
+        dev->start();
+        QVERIFY(PgsqlManager::allClustersWork({main.get(), dev.get()}));
 
-    FakePrograms fakes;
-    fakes.add(QStringLiteral("pg_lsclusters"), "[ \"$*\" = --no-header ] || exit 9\n" + twoClusters.toUtf8());
-    PgsqlManager manager;
-    manager.readClusters();
-    const QList<QPointer<PgsqlCluster>> first(manager.getClusters().cbegin(), manager.getClusters().cend());
-    QCOMPARE(first.size(), 2);
+        // Only the versioned server package counts, not postgresql-common or a client.
+        fakes.add(QStringLiteral("dpkg-query"), "[ \"$3\" = 'postgresql-[0123456789]*' ] && echo 'install ok installed'");
+        QVERIFY(PgsqlManager().packagesInslled());
 
-    if (script.isNull())
-        fakes.useOnlyFakes(), QFile::remove(fakes.filePath(QStringLiteral("pg_lsclusters")));
-    else
-        fakes.add(QStringLiteral("pg_lsclusters"), "[ \"$*\" = --no-header ] || exit 9\n" + script.toUtf8());
-    QCOMPARE(thrown([&] { manager.readClusters(); }), message);
-    QCOMPARE(describe(manager.getClusters()), clusters);
-    // Every read, failing ones included, deletes the clusters of the one before.
-    for (const QPointer<PgsqlCluster> &c : first)
-        QVERIFY(c.isNull());
+        // A status that crashes is an error, not "not running".
+        fakes.add(QStringLiteral("pg_ctlcluster"), "kill -TERM $$");
+        QCOMPARE(thrown([&] { main->isWork(); }), QStringLiteral("Process 'pg_ctlcluster 15 main status' not finished"));
+    }
 
-    // In the background: the failure first, then the clusters read before it.
-    PgsqlManagerAsync async;
-    AsyncLog log(&async);
-    async.startReadClusters();
-    QStringList expected{"clustersReaded(" + clusters + ')'};
-    if (!message.isNull())
-        expected.prepend("exceptionArise(" + message + ')');
-    QTRY_COMPARE_WITH_TIMEOUT(log.entries.size(), expected.size(), 35000);
-    QCOMPARE(log.entries, expected);
-}
+    void readClusters_data()
+    {
+        QTest::addColumn<QString>("script"); // null: no pg_lsclusters at all
+        QTest::addColumn<QString>("clusters");
+        QTest::addColumn<QString>("message");
 
-void PgsqlTest::asynchronousReadDestroyedWhileRunning()
-{
-    FakePrograms fakes;
-    fakes.add(QStringLiteral("pg_lsclusters"), "sleep 1\necho '11 main 5432 online postgres /a /b'");
+        QTest::newRow("two clusters, blank line skipped") << twoClusters << "11/main:5432,15/dev:5433" << QString();
+        QTest::newRow("malformed second line keeps the first")
+            << "printf '11 main 5432 online postgres /a /b\\nbroken line\\n15 dev 5433 down postgres /c /d\\n'"
+            << "11/main:5432" << "Cluster info not valid 'broken line'";
+        QTest::newRow("tool fails") << "echo 'Error: no permission' >&2; exit 1" << ""
+                                    << "Process 'pg_lsclusters --no-header' execute with error code '1'. Error: no permission\n";
+        QTest::newRow("tool missing") << QString() << "" << "Process 'pg_lsclusters --no-header' not finished";
+    }
 
-    auto *manager = new PgsqlManagerAsync;
-    AsyncLog log(manager);
-    manager->startReadClusters();
-    manager->startReadClusters(); // ignored while the first read runs
-    QTRY_COMPARE_WITH_TIMEOUT(log.entries.size(), 1, 35000);
-    QTest::qWait(100);
-    QCOMPARE(log.entries, QStringList{"clustersReaded(11/main:5432)"});
+    void readClusters()
+    {
+        QFETCH(QString, script);
+        QFETCH(QString, clusters);
+        QFETCH(QString, message);
 
-    manager->startReadClusters();
-    delete manager; // waits for the running read instead of leaving it a dead manager
-    QCoreApplication::processEvents();
-    QCOMPARE(log.entries.size(), 1);
-}
+        FakePrograms fakes;
+        fakes.add(QStringLiteral("pg_lsclusters"), "[ \"$*\" = --no-header ] || exit 9\n" + twoClusters.toUtf8());
+        PgsqlManager manager;
+        manager.readClusters();
+        const QList<QPointer<PgsqlCluster>> first(manager.getClusters().cbegin(), manager.getClusters().cend());
+        QCOMPARE(first.size(), 2);
 
-void PgsqlTest::realCluster()
-{
-    // A throw-away cluster of our own (pg_createcluster picks a free port),
-    // dropped again whatever happens.
-    const QStringList versions = QDir(QStringLiteral("/usr/lib/postgresql")).entryList(QDir::Dirs | QDir::NoDotAndDotDot);
-    if (geteuid() != 0 || versions.isEmpty() || QStandardPaths::findExecutable(QStringLiteral("pg_createcluster")).isEmpty())
-        QSKIP("creating a PostgreSQL cluster needs root, a PostgreSQL server and pg_createcluster");
-    const QString version = *std::max_element(versions.begin(), versions.end(),
-                                              [](const QString &a, const QString &b) { return a.toInt() < b.toInt(); });
-    const QString name = QStringLiteral("kvttest_%1").arg(getpid());
-    if (QProcess::execute(QStringLiteral("pg_createcluster"), {version, name}) != 0)
-        QSKIP("pg_createcluster failed");
-    const auto drop = qScopeGuard(
-        [&] { QProcess::execute(QStringLiteral("pg_dropcluster"), {QStringLiteral("--stop"), version, name}); });
+        if (script.isNull())
+            fakes.useOnlyFakes(), QFile::remove(fakes.filePath(QStringLiteral("pg_lsclusters")));
+        else
+            fakes.add(QStringLiteral("pg_lsclusters"), "[ \"$*\" = --no-header ] || exit 9\n" + script.toUtf8());
+        QCOMPARE(thrown([&] { manager.readClusters(); }), message);
+        QCOMPARE(describe(manager.getClusters()), clusters);
+        // Every read, failing ones included, deletes the clusters of the one before.
+        for (const QPointer<PgsqlCluster> &c : first)
+            QVERIFY(c.isNull());
 
-    PgsqlManager manager;
-    manager.readClusters();
-    PgsqlCluster *ours = nullptr;
-    for (PgsqlCluster *c : manager.getClusters())
-        ours = c->name() == name ? c : ours;
-    QVERIFY2(ours, "the new cluster is not listed");
-    QCOMPARE(ours->version() + ' ' + ours->owner(), version + " postgres");
-    QVERIFY(!ours->isWork());
-    ours->start();
-    QVERIFY(ours->isWork());
-    QVERIFY(PgsqlManager().packagesInslled());
+        // In the background: the failure first, then the clusters read before it.
+        PgsqlManagerAsync async;
+        QStringList log;
+        watch(&async, &log);
+        async.startReadClusters();
+        QStringList expected{"clustersReaded(" + clusters + ')'};
+        if (!message.isNull())
+            expected.prepend("exceptionArise(" + message + ')');
+        QTRY_COMPARE_WITH_TIMEOUT(log.size(), expected.size(), 35000);
+        QCOMPARE(log, expected);
+    }
 
-    const QString user = QStringLiteral("kvt_user_%1").arg(getpid());
-    ours->createUser(user);
-    ours->createUser(user); // present already: nothing to do, no error
-    QCOMPARE(ours->usernames().count(user), 1);
-    ours->deleteUser(user);
-    ours->deleteUser(user);
-    QVERIFY(!ours->usernames().contains(user));
-    // A statement the server rejects comes back with psql's message.
-    const QString message = thrown([&] { ours->sqlRequest(QStringLiteral("create user select;")); });
-    QVERIFY2(message.contains(QLatin1String("execute with error code")) && message.contains(QLatin1String("ERROR")),
-             qPrintable(message));
-}
+    void asynchronousReadDestroyedWhileRunning()
+    {
+        FakePrograms fakes;
+        fakes.add(QStringLiteral("pg_lsclusters"), "sleep 1\necho '11 main 5432 online postgres /a /b'");
+
+        auto *manager = new PgsqlManagerAsync;
+        QStringList log;
+        watch(manager, &log);
+        manager->startReadClusters();
+        manager->startReadClusters(); // ignored while the first read runs
+        QTRY_COMPARE_WITH_TIMEOUT(log.size(), 1, 35000);
+        QTest::qWait(100);
+        QCOMPARE(log, QStringList{"clustersReaded(11/main:5432)"});
+
+        manager->startReadClusters();
+        delete manager; // waits for the running read instead of leaving it a dead manager
+        QCoreApplication::processEvents();
+        QCOMPARE(log.size(), 1);
+    }
+
+    void realCluster()
+    {
+        // A throw-away cluster of our own (pg_createcluster picks a free port),
+        // dropped again whatever happens.
+        const QStringList versions = QDir(QStringLiteral("/usr/lib/postgresql")).entryList(QDir::Dirs | QDir::NoDotAndDotDot);
+        if (geteuid() != 0 || versions.isEmpty() || QStandardPaths::findExecutable(QStringLiteral("pg_createcluster")).isEmpty())
+            QSKIP("creating a PostgreSQL cluster needs root, a PostgreSQL server and pg_createcluster");
+        const QString version = *std::max_element(versions.begin(), versions.end(),
+                                                  [](const QString &a, const QString &b) { return a.toInt() < b.toInt(); });
+        const QString name = QStringLiteral("kvttest_%1").arg(getpid());
+        if (QProcess::execute(QStringLiteral("pg_createcluster"), {version, name}) != 0)
+            QSKIP("pg_createcluster failed");
+        const auto drop = qScopeGuard(
+            [&] { QProcess::execute(QStringLiteral("pg_dropcluster"), {QStringLiteral("--stop"), version, name}); });
+
+        PgsqlManager manager;
+        manager.readClusters();
+        PgsqlCluster *ours = nullptr;
+        for (PgsqlCluster *c : manager.getClusters())
+            ours = c->name() == name ? c : ours;
+        QVERIFY2(ours, "the new cluster is not listed");
+        QCOMPARE(ours->version() + ' ' + ours->owner(), version + " postgres");
+        QVERIFY(!ours->isWork());
+        ours->start();
+        QVERIFY(ours->isWork());
+        QVERIFY(PgsqlManager().packagesInslled());
+
+        const QString user = QStringLiteral("kvt_user_%1").arg(getpid());
+        ours->createUser(user);
+        QVERIFY(ours->usernames().contains(user));
+        ours->deleteUser(user);
+        QVERIFY(!ours->usernames().contains(user));
+        // A statement the server rejects comes back with psql's message.
+        const QString message = thrown([&] { ours->sqlRequest(QStringLiteral("create user select;")); });
+        QVERIFY2(message.contains(QLatin1String("execute with error code")) && message.contains(QLatin1String("ERROR")),
+                 qPrintable(message));
+    }
+};
 
 QTEST_GUILESS_MAIN(PgsqlTest)
 #include "tst_pgsql.moc"

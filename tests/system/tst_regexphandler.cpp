@@ -39,282 +39,209 @@ struct KeyValueHandler : RegExpHandler {
     const QByteArray appendTail;
 };
 
-QString randomPattern(QRandomGenerator &random, int depth)
-{
-    static const char *const atoms[] = {"a", "b", "k", "e", "y", "=", "0", "1", " ", "-", "_", ".", "\\.", "\\-",
-                                        "\\=", "\\d", "\\D", "\\s", "\\S", "\\w", "\\W", "[a-c]", "[^=]", "[0-9_]",
-                                        "[.=]", "[^ ]", "[k-y0]", "^", "$",
-                                        // outside the common subset
-                                        "\\b", "[[:alpha:]]", "(?=a)", "\\x41"};
-    static const char *const quantifiers[] = {"", "", "", "*", "+", "?", "{2}", "{1,3}", "{0,}", "{2,}", "{,2}", "*?"};
-    QString pattern;
-    for (int i = 0, pieces = 1 + int(random.bounded(4)); i < pieces; ++i) {
-        if (depth < 2 && random.bounded(4) == 0) {
-            pattern += QLatin1String(random.bounded(2) ? "(" : "(?:") + randomPattern(random, depth + 1);
-            if (random.bounded(2))
-                pattern += QLatin1Char('|') + randomPattern(random, depth + 1);
-            pattern += QLatin1Char(')');
-        } else {
-            pattern += QLatin1String(atoms[random.bounded(int(std::size(atoms)))]);
-        }
-        pattern += QLatin1String(quantifiers[random.bounded(int(std::size(quantifiers)))]);
-    }
-    return pattern;
-}
-
 } // namespace
 
 class RegExpHandlerTest : public QObject
 {
     Q_OBJECT
 
-private Q_SLOTS:
-    void init();
-    void rewriteContent_data();
-    void rewriteContent();
-    void matchingAgreesWithQRegExp();
-    void rewriteKeepsFileIdentityAndBackup();
-    void failures_data();
-    void failures();
-
-private:
-    QString path(const QString &name) const { return _dir->filePath(name); }
-    QStringList folderState() const;
-
     std::unique_ptr<QTemporaryDir> _dir;
-};
-
-void RegExpHandlerTest::init()
-{
-    _dir.reset(new QTemporaryDir);
-}
-
-// Every entry under the folder as "name=content" (byte for byte), "name/" or "name=<symlink>".
-QStringList RegExpHandlerTest::folderState() const
-{
-    QStringList state;
-    QDirIterator it(_dir->path(), QDir::AllEntries | QDir::NoDotAndDotDot | QDir::Hidden | QDir::System,
-                    QDirIterator::Subdirectories);
-    while (it.hasNext()) {
-        const QFileInfo info(it.next());
-        const QString name = QDir(_dir->path()).relativeFilePath(info.filePath());
-        state << (info.isSymLink() ? name + QStringLiteral("=<symlink>")
-                  : info.isDir()   ? name + QLatin1Char('/')
-                                   : name + QLatin1Char('=') + QString::fromLatin1(readFile(info.filePath())));
+    QString path(const QString &name) const { return _dir->filePath(name); }
+    // Every entry under the folder as "name=content" (byte for byte), "name/" or "name=<symlink>".
+    QStringList folderState() const
+    {
+        QStringList state;
+        QDirIterator it(_dir->path(), QDir::AllEntries | QDir::NoDotAndDotDot | QDir::Hidden | QDir::System,
+                        QDirIterator::Subdirectories);
+        while (it.hasNext()) {
+            const QFileInfo info(it.next());
+            const QString name = QDir(_dir->path()).relativeFilePath(info.filePath());
+            state << (info.isSymLink() ? name + QStringLiteral("=<symlink>")
+                      : info.isDir()   ? name + QLatin1Char('/')
+                                       : name + QLatin1Char('=') + QString::fromLatin1(readFile(info.filePath())));
+        }
+        state.sort();
+        return state;
     }
-    state.sort();
-    return state;
-}
 
-void RegExpHandlerTest::rewriteContent_data()
-{
-    QTest::addColumn<QByteArray>("input");
-    QTest::addColumn<QString>("replace"); // "key=new value"
-    QTest::addColumn<QByteArray>("tail"); // null: nothing appended
-    QTest::addColumn<QByteArray>("expected");
+private Q_SLOTS:
+    void init() { _dir.reset(new QTemporaryDir); }
 
-    const QByteArray untouched("# a comment\r\n\n   \t \n\tfoo bar baz\r\n#key = 1\nkey = v  # kept\r\n"
-                               "\xff\xfe not utf-8 = \x80\n" "nul\0byte = 1\n" "\0\0\0\n" "trailing = blank   ", 106);
-    QTest::newRow("untouched lines are copied byte for byte") << untouched << QString() << QByteArray() << untouched;
-    QTest::newRow("replaced lines: comment back after a tab, LF ending")
-        << QByteArray("key = 1\nother = 2\r\n  key = 3   # a # b  \r\n") << "key=x" << QByteArray()
-        << QByteArray("key = x\nother = 2\r\nkey = x\t# a # b\n");
-    QTest::newRow("bare hash is put back") << QByteArray("key = old #\t \n") << "key=new" << QByteArray()
-                                           << QByteArray("key = new\t#\n");
-    QTest::newRow("hash inside quotes starts a comment")
-        << QByteArray("key = \"a#b\"\n") << "key=new" << QByteArray() << QByteArray("key = new\t#b\"\n");
-    QTest::newRow("emptied line is removed with its comment")
-        << QByteArray("a = 1\nkill = x # gone too\nb = 2\n") << "kill=" << QByteArray() << QByteArray("a = 1\nb = 2\n");
-    QTest::newRow("replaced last line gains a terminator")
-        << QByteArray("a = 1\nkey = v") << "key=w" << QByteArray() << QByteArray("a = 1\nkey = w\n");
-    QTest::newRow("tail written as it stands, even after an unterminated line")
-        << QByteArray("a = 1") << QString() << QByteArray("b = 2\nc = 3") << QByteArray("a = 1b = 2\nc = 3");
-    QTest::newRow("comment after a NUL byte is not seen")
-        << QByteArray("key = old\0 # hidden\n", 20) << "key=new" << QByteArray() << QByteArray("key = new\n");
-    QTest::newRow("non-UTF-8 comment is decoded")
-        << QByteArray("key = old # caf\xe9\n") << "key=new" << QByteArray() << QByteArray("key = new\t# caf\xef\xbf\xbd\n");
-    const QByteArray longValue(1024 * 1024, 'v');
-    const QByteArray longComment = "# " + QByteArray(1024 * 1024, 'c') + "\r\n";
-    QTest::newRow("1 MiB lines, one kept and one replaced")
-        << QByteArray(longComment + "big = " + longValue + "\nhuge = " + longValue + "\n") << "huge=small" << QByteArray()
-        << QByteArray(longComment + "big = " + longValue + "\nhuge = small\n");
-}
+    void rewriteContent_data()
+    {
+        QTest::addColumn<QByteArray>("input");
+        QTest::addColumn<QString>("replace"); // "key=new value"
+        QTest::addColumn<QByteArray>("tail"); // null: nothing appended
+        QTest::addColumn<QByteArray>("expected");
 
-void RegExpHandlerTest::rewriteContent()
-{
-    QFETCH(QByteArray, input);
-    QFETCH(QString, replace);
-    QFETCH(QByteArray, tail);
-    QFETCH(QByteArray, expected);
+        const QByteArray untouched("# a comment\r\n\n   \t \n\tfoo bar baz\r\n#key = 1\nkey = v  # kept\r\n"
+                                   "\xff\xfe not utf-8 = \x80\n" "nul\0byte = 1\n" "\0\0\0\n" "trailing = blank   ", 106);
+        QTest::newRow("untouched lines are copied byte for byte") << untouched << QString() << QByteArray() << untouched;
+        QTest::newRow("replaced lines: comment back after a tab, LF ending")
+            << QByteArray("key = 1\nother = 2\r\n  key = 3   # a # b  \r\n") << "key=x" << QByteArray()
+            << QByteArray("key = x\nother = 2\r\nkey = x\t# a # b\n");
+        QTest::newRow("hash inside quotes starts a comment")
+            << QByteArray("key = \"a#b\"\n") << "key=new" << QByteArray() << QByteArray("key = new\t#b\"\n");
+        QTest::newRow("emptied line is removed with its comment")
+            << QByteArray("a = 1\nkill = x # gone too\nb = 2\n") << "kill=" << QByteArray() << QByteArray("a = 1\nb = 2\n");
+        QTest::newRow("replaced last line gains a terminator")
+            << QByteArray("a = 1\nkey = v") << "key=w" << QByteArray() << QByteArray("a = 1\nkey = w\n");
+        QTest::newRow("tail written as it stands, even after an unterminated line")
+            << QByteArray("a = 1") << QString() << QByteArray("b = 2\nc = 3") << QByteArray("a = 1b = 2\nc = 3");
+        QTest::newRow("comment after a NUL byte is not seen")
+            << QByteArray("key = old\0 # hidden\n", 20) << "key=new" << QByteArray() << QByteArray("key = new\n");
+        QTest::newRow("non-UTF-8 comment is decoded")
+            << QByteArray("key = old # caf\xe9\n") << "key=new" << QByteArray() << QByteArray("key = new\t# caf\xef\xbf\xbd\n");
+    }
 
-    const QString file = path(QStringLiteral("test.conf"));
-    QVERIFY(writeFile(file, input));
-    KeyValueHandler handler(replace, tail);
-    QString error;
-    QVERIFY2(RegExpHandler::rewriteSystemConfigureFile(file, handler, error, false), qPrintable(error));
-    // No work copy is left and no backup made.
-    QCOMPARE(folderState(), QStringList{"test.conf=" + QString::fromLatin1(expected)});
-}
+    void rewriteContent()
+    {
+        QFETCH(QByteArray, input);
+        QFETCH(QString, replace);
+        QFETCH(QByteArray, tail);
+        QFETCH(QByteArray, expected);
 
-void RegExpHandlerTest::matchingAgreesWithQRegExp()
-{
-    // Lines are selected quickly for common expressions; whatever the route,
-    // the handler must see exactly the matches QRegExp itself finds in the
-    // text before the comment. The expression may change between lines: the
-    // first line of each file switches to the one under test.
-    struct MatchRecorder : RegExpHandler {
-        explicit MatchRecorder(const QString &next) : RegExpHandler(QStringLiteral("^switch$")), next(next) {}
-        bool handleRegExp(QByteArray *) override
-        {
-            if (regExp().pattern() != next)
-                regExp().setPattern(next);
-            else
-                matches << regExp().cap(0);
-            return false;
-        }
-        const QString next;
-        QStringList matches;
-    };
-
-    QStringList patterns{"^(\\w+)\\s*=\\s*(.*)$", "^(key\\d*[02468]00)\\s*=", "a|^b", "$", "^$", "^", "x*", "(a|)+b",
-                         "((a)*)*b", ".{2,3}=", "[^=]+=[^=]*$", "a{0}b", "(?:ab){2,}", "e$|^k", "=\\s+$"};
-    QRandomGenerator random(20240611);
-    for (int i = 0; i < 400; ++i)
-        patterns << randomPattern(random, 0);
-
-    static const char alphabet[] = "abkey=019 -_.\tAB";
-    const QString file = path(QStringLiteral("agree.conf"));
-    for (const QString &pattern : qAsConst(patterns)) {
-        QByteArray content("switch\n");
-        QStringList expected;
-        QRegExp reference(pattern, Qt::CaseSensitive, QRegExp::RegExp);
-        for (int line = 0; line < 60; ++line) {
-            QByteArray text;
-            for (int k = 0, length = int(random.bounded(13)); k < length; ++k)
-                text += alphabet[random.bounded(int(sizeof alphabet - 1))];
-            if (random.bounded(10) == 0) // some lines take the decoding route; Unicode blanks are trimmed too
-                text = "\xc2\xa0\xc3\xa9" + text + "\xe2\x80\x83";
-            if (random.bounded(20) == 0) // the text ends at a NUL byte
-                text += '\0' + text;
-            if (random.bounded(6) == 0)
-                text += " # note";
-            content += text + '\n';
-            const QString candidate = QString::fromUtf8(text).section(QLatin1Char('#'), 0, 0).trimmed();
-            if (!candidate.isEmpty() && reference.indexIn(candidate) != -1)
-                expected << reference.cap(0);
-        }
-        QVERIFY(writeFile(file, content));
-        MatchRecorder recorder(pattern);
+        const QString file = path(QStringLiteral("test.conf"));
+        QVERIFY(writeFile(file, input));
+        KeyValueHandler handler(replace, tail);
         QString error;
-        QVERIFY(RegExpHandler::readSystemConfigureFile(file, recorder, error));
-        QVERIFY2(recorder.matches == expected, qPrintable(QStringLiteral("pattern %1: %2 matches, %3 expected")
-                                                              .arg(pattern).arg(recorder.matches.size()).arg(expected.size())));
+        QVERIFY2(RegExpHandler::rewriteSystemConfigureFile(file, handler, error, false), qPrintable(error));
+        // No work copy is left and no backup made.
+        QCOMPARE(folderState(), QStringList{"test.conf=" + QString::fromLatin1(expected)});
     }
-}
 
-void RegExpHandlerTest::rewriteKeepsFileIdentityAndBackup()
-{
-    // Blanks, quotes and shell syntax in the name reach cp as one argument.
-    const QString file = path(QStringLiteral("my conf $HOME;`id` 'x'.conf"));
-    const QByteArray native = QFile::encodeName(file);
-    QVERIFY(writeFile(file, "key = 1\n") && writeFile(file + QStringLiteral(".bak"), "older backup\n"));
-    QCOMPARE(::chmod(native.constData(), 0640), 0);
-    if (const struct passwd *nobody = geteuid() == 0 ? getpwnam("nobody") : nullptr)
-        QCOMPARE(::chown(native.constData(), nobody->pw_uid, nobody->pw_gid), 0);
-    const auto identity = [&] {
-        struct stat st = {};
-        ::stat(native.constData(), &st);
-        return QVector<qulonglong>{st.st_ino, st.st_mode, st.st_uid, st.st_gid};
-    };
-    const QVector<qulonglong> before = identity();
+    void matchingAgreesWithQRegExp()
+    {
+        // Lines are selected quickly for common expressions; whatever the route,
+        // the handler must see exactly the matches QRegExp itself finds in the
+        // text before the comment.
+        struct MatchRecorder : RegExpHandler {
+            using RegExpHandler::RegExpHandler;
+            bool handleRegExp(QByteArray *) override
+            {
+                matches << regExp().cap(0);
+                return false;
+            }
+            QStringList matches;
+        };
 
-    QString error;
-    KeyValueHandler second(QStringLiteral("key=2"));
-    QVERIFY2(RegExpHandler::rewriteSystemConfigureFile(file, second, error, false), qPrintable(error));
-    QCOMPARE(readFile(file + QStringLiteral(".bak")), QByteArray("older backup\n"));
-    KeyValueHandler third(QStringLiteral("key=3"));
-    QVERIFY2(RegExpHandler::rewriteSystemConfigureFile(file, third, error, true), qPrintable(error));
-    QCOMPARE(folderState(), (QStringList{"my conf $HOME;`id` 'x'.conf.bak=key = 2\n", "my conf $HOME;`id` 'x'.conf=key = 3\n"}));
-    QCOMPARE(identity(), before); // inode, mode and owner
-}
+        // Some of them outside the common subset.
+        const QStringList patterns{"^(\\w+)\\s*=\\s*(.*)$", "^(key\\d*[02468]00)\\s*=", "a|^b", "$", "^$", "^", "x*",
+                                   "(a|)+b", "((a)*)*b", ".{2,3}=", "[^=]+=[^=]*$", "a{0}b", "(?:ab){2,}", "e$|^k",
+                                   "=\\s+$", "[k-y0]+\\S", "\\W\\d?[.=]", "[^ ]{,2}", "\\D*?=", "\\bk", "[[:alpha:]]+",
+                                   "(?=a)", "\\x41", "(k|e)(y|=){1,3}"};
+        QRandomGenerator random(20240611);
 
-void RegExpHandlerTest::failures_data()
-{
-    // Each case prepares the folder, optionally puts a fake cp first on PATH,
-    // rewrites "f.conf" ("key = old\n", key replaced by "new") with a backup,
-    // and checks the message against a pattern and the exact folder state.
-    QTest::addColumn<QString>("setup"); // shell commands run in the folder first
-    QTest::addColumn<QByteArray>("fakeCp"); // null: the real cp; "none": no cp at all
-    QTest::addColumn<QString>("messagePattern"); // FOLDER stands for the folder path
-    QTest::addColumn<QStringList>("state");
-
-    const QString cp = QStringLiteral("Process: \"cp --force --preserve=mode,ownership ");
-    const QString first = "^" + QRegularExpression::escape(cp + "FOLDER/f.conf FOLDER/f.conf.tmp\"");
-    const QString second = "^" + QRegularExpression::escape(cp + "FOLDER/f.conf.tmp FOLDER/f.conf\"");
-    // Calls the real cp, then damages something depending on which copy it is.
-    const auto sabotage = [](const char *onFirst, const char *onSecond) {
-        return "/bin/cp \"$@\" || exit $?\ncase \"$3\" in *.tmp) " + QByteArray(onSecond) + " ;; *) " + onFirst
-               + " ;; esac\nexit 0";
-    };
-    const QString old = QStringLiteral("f.conf=key = old\n");
-
-    QTest::newRow("missing file") << "rm f.conf" << QByteArray() << "^\"FOLDER/f\\.conf\" not exists$" << QStringList();
-    QTest::newRow("target is a folder")
-        << "rm f.conf; mkdir f.conf" << QByteArray() << first + "\\. Exit code: 1\\.\n\"[^\n]*cp: [^\n]+\"$" << QStringList{"f.conf/"};
-    QTest::newRow("cp not found")
-        << "" << QByteArray("none") << first + "\\. Error: [^\n]+\\.\n\"Not started\"$" << QStringList{old};
-    QTest::newRow("cp fails, message trimmed")
-        << "" << QByteArray("printf '\\n  cp: disk on fire  \\n\\n' >&2\nexit 3")
-        << first + "\\. Exit code: 3\\.\n\"cp: disk on fire\"$" << QStringList{old};
-    QTest::newRow("stale work folder")
-        << "mkdir f.conf.tmp" << QByteArray() << "^\"FOLDER/f\\.conf\\.tmp\" error 5\n[^\n]+$"
-        << QStringList{old, "f.conf.tmp/", "f.conf.tmp/f.conf=key = old\n"};
-    QTest::newRow("work copy cannot be written completely")
-        << "" << sabotage("rm -f \"$4\"; ln -s /dev/full \"$4\"", ":")
-        << "^\"FOLDER/f\\.conf\\.tmp\" error \\d+\nNo space left on device$" << QStringList{old, "f.conf.tmp=<symlink>"};
-    QTest::newRow("backup cannot replace a folder")
-        << "mkdir f.conf.bak; echo x > f.conf.bak/keep" << QByteArray() << "^\"FOLDER/f\\.conf\" error \\d+\n[^\n]+$"
-        << QStringList{old, "f.conf.bak/", "f.conf.bak/keep=x\n", "f.conf.tmp=key = new\n"};
-    QTest::newRow("copy back fails")
-        << "" << QByteArray("case \"$3\" in *.tmp) echo 'cp: cannot write' >&2; exit 1 ;; esac\nexec /bin/cp \"$@\"")
-        << second + "\\. Exit code: 1\\.\n\"cp: cannot write\"$"
-        << QStringList{old, "f.conf.bak=key = old\n", "f.conf.tmp=key = new\n"};
-    QTest::newRow("work copy cannot be deleted")
-        << "" << sabotage(":", "rm -f \"$3\"; mkdir \"$3\"; echo x > \"$3/keep\"")
-        << "^\"FOLDER/f\\.conf\\.tmp\" error \\d+\n[^\n]+$" << QStringList{"f.conf=key = new\n", "f.conf.bak=key = old\n", "f.conf.tmp/", "f.conf.tmp/keep=x\n"};
-}
-
-void RegExpHandlerTest::failures()
-{
-    QFETCH(QString, setup);
-    QFETCH(QByteArray, fakeCp);
-    QFETCH(QString, messagePattern);
-    QFETCH(QStringList, state);
-
-    const QString file = path(QStringLiteral("f.conf"));
-    QVERIFY(writeFile(file, "key = old\n"));
-    QCOMPARE(QProcess::execute(QStringLiteral("/bin/sh"), {QStringLiteral("-c"), "cd \"$0\" || exit 1\n" + setup, _dir->path()}), 0);
-
-    std::unique_ptr<FakePrograms> fakes;
-    if (!fakeCp.isNull()) {
-        fakes.reset(new FakePrograms);
-        if (fakeCp == "none")
-            fakes->useOnlyFakes();
-        else
-            fakes->add(QStringLiteral("cp"), fakeCp);
+        static const char alphabet[] = "abkey=019 -_.\tAB";
+        const QString file = path(QStringLiteral("agree.conf"));
+        for (const QString &pattern : qAsConst(patterns)) {
+            QByteArray content;
+            QStringList expected;
+            QRegExp reference(pattern, Qt::CaseSensitive, QRegExp::RegExp);
+            for (int line = 0; line < 400; ++line) {
+                QByteArray text;
+                for (int k = 0, length = int(random.bounded(13)); k < length; ++k)
+                    text += alphabet[random.bounded(int(sizeof alphabet - 1))];
+                if (random.bounded(10) == 0) // some lines take the decoding route; Unicode blanks are trimmed too
+                    text = "\xc2\xa0\xc3\xa9" + text + "\xe2\x80\x83";
+                if (random.bounded(20) == 0) // the text ends at a NUL byte
+                    text += '\0' + text;
+                if (random.bounded(6) == 0)
+                    text += " # note";
+                content += text + '\n';
+                const QString candidate = QString::fromUtf8(text).section(QLatin1Char('#'), 0, 0).trimmed();
+                if (!candidate.isEmpty() && reference.indexIn(candidate) != -1)
+                    expected << reference.cap(0);
+            }
+            QVERIFY(writeFile(file, content));
+            MatchRecorder recorder(pattern);
+            QString error;
+            QVERIFY(RegExpHandler::readSystemConfigureFile(file, recorder, error));
+            QVERIFY2(recorder.matches == expected, qPrintable(QStringLiteral("pattern %1: %2 matches, %3 expected")
+                                                                  .arg(pattern).arg(recorder.matches.size()).arg(expected.size())));
+        }
     }
-    KeyValueHandler handler(QStringLiteral("key=new"));
-    QString error = QStringLiteral("earlier");
-    QVERIFY(!RegExpHandler::rewriteSystemConfigureFile(file, handler, error, true));
-    fakes.reset();
 
-    // The message follows the earlier text on a line of its own.
-    const QRegularExpression re(messagePattern.replace(0, 1, QStringLiteral("^earlier\n"))
-                                    .replace(QLatin1String("FOLDER"), QRegularExpression::escape(_dir->path())));
-    QVERIFY2(re.match(error).hasMatch(), qPrintable(error));
-    state.sort();
-    QCOMPARE(folderState(), state);
-}
+    void rewriteKeepsFileIdentityAndBackup()
+    {
+        // Blanks, quotes and shell syntax in the name reach cp as one argument.
+        const QString file = path(QStringLiteral("my conf $HOME;`id` 'x'.conf"));
+        const QByteArray native = QFile::encodeName(file);
+        QVERIFY(writeFile(file, "key = 1\n") && writeFile(file + QStringLiteral(".bak"), "older backup\n"));
+        QCOMPARE(::chmod(native.constData(), 0640), 0);
+        if (const struct passwd *nobody = geteuid() == 0 ? getpwnam("nobody") : nullptr)
+            QCOMPARE(::chown(native.constData(), nobody->pw_uid, nobody->pw_gid), 0);
+        const auto identity = [&] {
+            struct stat st = {};
+            ::stat(native.constData(), &st);
+            return QVector<qulonglong>{st.st_ino, st.st_mode, st.st_uid, st.st_gid};
+        };
+        const QVector<qulonglong> before = identity();
+
+        QString error;
+        KeyValueHandler handler(QStringLiteral("key=3"));
+        QVERIFY2(RegExpHandler::rewriteSystemConfigureFile(file, handler, error, true), qPrintable(error));
+        // An older backup is replaced.
+        QCOMPARE(folderState(), (QStringList{"my conf $HOME;`id` 'x'.conf.bak=key = 1\n", "my conf $HOME;`id` 'x'.conf=key = 3\n"}));
+        QCOMPARE(identity(), before); // inode, mode and owner
+    }
+
+    void failures_data()
+    {
+        // Each case prepares the folder, optionally puts a fake cp first on PATH,
+        // rewrites "f.conf" ("key = old\n", key replaced by "new") with a backup,
+        // and checks the message against a pattern and the exact folder state.
+        QTest::addColumn<QString>("setup"); // shell commands run in the folder first
+        QTest::addColumn<QByteArray>("fakeCp"); // null: the real cp
+        QTest::addColumn<QString>("messagePattern"); // FOLDER stands for the folder path
+        QTest::addColumn<QStringList>("state");
+
+        const QString cp = QStringLiteral("Process: \"cp --force --preserve=mode,ownership ");
+        const QString first = "^" + QRegularExpression::escape(cp + "FOLDER/f.conf FOLDER/f.conf.tmp\"");
+        const QString second = "^" + QRegularExpression::escape(cp + "FOLDER/f.conf.tmp FOLDER/f.conf\"");
+        const QString old = QStringLiteral("f.conf=key = old\n");
+
+        QTest::newRow("missing file") << "rm f.conf" << QByteArray() << "^\"FOLDER/f\\.conf\" not exists$" << QStringList();
+        QTest::newRow("target is a folder")
+            << "rm f.conf; mkdir f.conf" << QByteArray() << first + "\\. Exit code: 1\\.\n\"[^\n]*cp: [^\n]+\"$" << QStringList{"f.conf/"};
+        QTest::newRow("cp fails, message trimmed")
+            << "" << QByteArray("printf '\\n  cp: disk on fire  \\n\\n' >&2\nexit 3")
+            << first + "\\. Exit code: 3\\.\n\"cp: disk on fire\"$" << QStringList{old};
+        QTest::newRow("work copy cannot be written completely")
+            << "" << QByteArray("/bin/cp \"$@\" && rm -f \"$4\" && ln -s /dev/full \"$4\"")
+            << "^\"FOLDER/f\\.conf\\.tmp\" error \\d+\nNo space left on device$" << QStringList{old, "f.conf.tmp=<symlink>"};
+            QTest::newRow("copy back fails")
+            << "" << QByteArray("case \"$3\" in *.tmp) echo 'cp: cannot write' >&2; exit 1 ;; esac\nexec /bin/cp \"$@\"")
+            << second + "\\. Exit code: 1\\.\n\"cp: cannot write\"$"
+            << QStringList{old, "f.conf.bak=key = old\n", "f.conf.tmp=key = new\n"};
+    }
+
+    void failures()
+    {
+        QFETCH(QString, setup);
+        QFETCH(QByteArray, fakeCp);
+        QFETCH(QString, messagePattern);
+        QFETCH(QStringList, state);
+
+        const QString file = path(QStringLiteral("f.conf"));
+        QVERIFY(writeFile(file, "key = old\n"));
+        QCOMPARE(QProcess::execute(QStringLiteral("/bin/sh"), {QStringLiteral("-c"), "cd \"$0\" || exit 1\n" + setup, _dir->path()}), 0);
+
+        FakePrograms fakes;
+        if (!fakeCp.isNull())
+            fakes.add(QStringLiteral("cp"), fakeCp);
+        KeyValueHandler handler(QStringLiteral("key=new"));
+        QString error = QStringLiteral("earlier");
+        QVERIFY(!RegExpHandler::rewriteSystemConfigureFile(file, handler, error, true));
+
+        // The message follows the earlier text on a line of its own.
+        const QRegularExpression re(messagePattern.replace(0, 1, QStringLiteral("^earlier\n"))
+                                        .replace(QLatin1String("FOLDER"), QRegularExpression::escape(_dir->path())));
+        QVERIFY2(re.match(error).hasMatch(), qPrintable(error));
+        state.sort();
+        QCOMPARE(folderState(), state);
+    }
+};
 
 QTEST_GUILESS_MAIN(RegExpHandlerTest)
 #include "tst_regexphandler.moc"
