@@ -6,7 +6,6 @@
 #include "dialoganswerer.h"
 #include "editwidget.h"
 #include "recordingmodule.h"
-#include "testtreenode.h"
 
 #include <QPointer>
 #include <QShowEvent>
@@ -14,8 +13,6 @@
 #include <qtestspontaneevent.h>
 
 #include <memory>
-
-Q_DECLARE_METATYPE(ElementWidgetRole)
 
 using Ordinary = TestElement<OrdinaryElement>;
 
@@ -77,8 +74,8 @@ private Q_SLOTS:
 
     void editing_data()
     {
-        // After some text typed, e, c, n: shows alice to edit, alice to create, nothing;
-        // t:<text> types, i:<text> imports, u sets unchanged.
+        // After some text typed, e, c: shows alice to edit, to create; t:<text> types,
+        // i:<text> imports, u sets unchanged.
         QTest::addColumn<QString>("steps");
         QTest::addColumn<QList<int>>("reported");
         QTest::addColumn<bool>("changed");
@@ -87,8 +84,6 @@ private Q_SLOTS:
         // Editing waits for a read; creating starts at once, invalid but unchanged.
         QTest::newRow("edit") << "e" << QList<int>{} << false << true;
         QTest::newRow("create twice resets once") << "c c" << QList<int>{2} << false << false;
-        QTest::newRow("element taken away") << "c n" << QList<int>{2} << false << true;
-        QTest::newRow("invalid edit") << "e t:" << QList<int>{2} << true << true;
         QTest::newRow("edit then unchanged") << "e t:x u" << QList<int>{3, 0} << false << true;
         QTest::newRow("import counts as change") << "e i:y" << QList<int>{3} << true << true;
         QTest::newRow("create: unchanged reports anyway") << "c u u" << QList<int>{2, 0, 0} << false << false;
@@ -103,19 +98,15 @@ private Q_SLOTS:
         EditWidget *editor = newEditor();
         editor->userTypes(QStringLiteral("before"));
         editor->reported.clear();
+        ElementData imported;
         for (const QString &step : steps.split(QLatin1Char(' '))) {
-            if (step == QLatin1String("e")) {
-                editor->setElement(alice, EditElementRole);
-            } else if (step == QLatin1String("c")) {
-                editor->setElement(alice, CreateElementRole);
-            } else if (step == QLatin1String("n")) {
-                editor->setElement(nullptr, NoElementRole);
-            } else if (step == QLatin1String("u")) {
+            if (step == QLatin1String("e") || step == QLatin1String("c"))
+                editor->setElement(alice, step == QLatin1String("e") ? EditElementRole : CreateElementRole);
+            else if (step == QLatin1String("u"))
                 editor->setUnchanged();
-            } else if (step.startsWith(QLatin1Char('t'))) {
+            else if (step.startsWith(QLatin1Char('t')))
                 editor->userTypes(step.mid(2));
-            } else {
-                ElementData imported;
+            else {
                 imported.insert(QStringLiteral("text"), step.mid(2));
                 editor->afterSuccessfulImport(&imported);
             }
@@ -139,48 +130,34 @@ private Q_SLOTS:
         editor->show();
         editor->hide();
         QCOMPARE(module->log, QStringList{"ReadProperty(user_alice)"});
-
-        // Nothing to read in the create role.
-        editor->setElement(alice, CreateElementRole);
-        editor->show();
-        QCOMPARE(module->log, QStringList{"ReadProperty(user_alice)"});
     }
 
     void setTreeNodeCurrent_data()
     {
         QTest::addColumn<QString>("target");
-        QTest::addColumn<ElementWidgetRole>("role");
         QTest::addColumn<int>("answer"); // to the question about unsaved text; none: nothing typed
         QTest::addColumn<bool>("madeCurrent");
-        QTest::addColumn<bool>("changedAfter");
 
         const int none = QMessageBox::NoButton;
-        QTest::newRow("plain node") << "node" << EditElementRole << none << false << false;
-        QTest::newRow("element") << "bob" << EditElementRole << none << true << false;
-        QTest::newRow("supplement, no display change") << "supplement" << EditElementRole << none << false << false;
-        QTest::newRow("supplement, display change") << "switching" << EditElementRole << none << true << false;
-        QTest::newRow("changed, answer no") << "bob" << EditElementRole << int(QMessageBox::No) << false << true;
-        // Going on keeps the edit flagged: it has still not been saved.
-        QTest::newRow("changed, answer yes") << "bob" << EditElementRole << int(QMessageBox::Yes) << true << true;
-        QTest::newRow("creating, answer yes") << "bob" << CreateElementRole << int(QMessageBox::Yes) << true << false;
+        QTest::newRow("element") << "bob" << none << true;
+        QTest::newRow("supplement, no display change") << "supplement" << none << false;
+        QTest::newRow("supplement, display change") << "switching" << none << true;
+        QTest::newRow("changed, answer no") << "bob" << int(QMessageBox::No) << false;
+        QTest::newRow("changed, answer yes") << "bob" << int(QMessageBox::Yes) << true;
     }
     void setTreeNodeCurrent()
     {
         QFETCH(QString, target);
-        QFETCH(ElementWidgetRole, role);
         QFETCH(int, answer);
         QFETCH(bool, madeCurrent);
-        QFETCH(bool, changedAfter);
 
         auto *plain = new TestElement<SupplementElement>(*module, rightsYes, QStringLiteral("extra"));
         auto *switching = new SwitchingSupplement(*module);
         alice->append(QList<TreeNode *>{plain, switching});
-        TestTreeNode node(QStringLiteral("node"));
-        const QMap<QString, TreeNode *> targets{
-            {"node", &node}, {"bob", bob}, {"supplement", plain}, {"switching", switching}};
+        const QMap<QString, TreeNode *> targets{{"bob", bob}, {"supplement", plain}, {"switching", switching}};
 
         EditWidget *editor = newEditor();
-        editor->setElement(alice, role);
+        editor->setElement(alice, EditElementRole);
         if (answer != QMessageBox::NoButton)
             editor->userTypes(QStringLiteral("unsaved"));
         QSignalSpy current(targets.value(target), SIGNAL(setCurrentNode(TreeNode *)));
@@ -190,7 +167,8 @@ private Q_SLOTS:
 
         QCOMPARE(current.count(), madeCurrent ? 1 : 0);
         QCOMPARE(switching->requested, target == QLatin1String("switching") ? QList<int>{0} : QList<int>{});
-        QCOMPARE(editor->isChanged(), changedAfter);
+        // Going on keeps the edit flagged: it has still not been saved.
+        QCOMPARE(editor->isChanged(), answer != QMessageBox::NoButton);
         const QString question = QStringLiteral("Element activation|Changes not saved!\nContinue without saving?|%1")
                                      .arg(int(QMessageBox::Yes | QMessageBox::No));
         QCOMPARE(answerer.seen, answer != QMessageBox::NoButton ? QStringList{question} : QStringList{});
@@ -206,22 +184,21 @@ private Q_SLOTS:
 
     void moduleKeepsOneWidgetPerType()
     {
-        module->insertElementWidget(nullptr);
-        QPointer<EditWidget> first = new EditWidget(*module, rightsYes, QStringLiteral("user"));
-        QPointer<EditWidget> second = new EditWidget(*module, rightsYes, QStringLiteral("user"));
-        QPointer<EditWidget> undefined = new EditWidget(*module, rightsYes, ContextOperation::undefinedElementType);
-        QPointer<EditWidget> group = new EditWidget(*module, rightsYes, QStringLiteral("group"));
-        for (EditWidget *widget : {first.data(), second.data(), undefined.data(), group.data()})
-            module->insertElementWidget(widget);
-        QVERIFY(first && group && !second && !undefined);
-        QCOMPARE(alice->elementWidget(EditElementRole), first.data());
-
+        QList<QPointer<EditWidget>> widgets; // the first of a type is kept; the undefined type is not
+        for (const QString &type : {QStringLiteral("user"), QStringLiteral("user"), QStringLiteral("group"),
+                                    ContextOperation::undefinedElementType}) {
+            widgets.append(new EditWidget(*module, rightsYes, type));
+            module->insertElementWidget(widgets.last());
+        }
+        QCOMPARE(widgets.count(nullptr), 2);
+        QVERIFY(widgets[0] && widgets[2]);
+        QCOMPARE(alice->elementWidget(EditElementRole), widgets[0].data());
         // A widget deleted elsewhere is forgotten and not deleted again.
-        delete group;
+        delete widgets[2];
         QVERIFY(!module->elementWidget(QStringLiteral("group")));
         root->clearDeleteAll();
         module.reset();
-        QVERIFY(!first);
+        QVERIFY(!widgets[0]);
     }
 };
 
