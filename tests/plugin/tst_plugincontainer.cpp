@@ -12,7 +12,6 @@
 #include <QApplication>
 #include <QLineEdit>
 #include <QPushButton>
-#include <QSettings>
 #include <QTreeView>
 #include <QtTest>
 
@@ -74,7 +73,6 @@ private Q_SLOTS:
         container.reset();
         while (QApplication::overrideCursor())
             QApplication::restoreOverrideCursor();
-        QSettings().clear();
     }
 
     void loadAndUnload()
@@ -110,8 +108,8 @@ private Q_SLOTS:
             Q_EMIT qobject_cast<Module *>(module)->customContextMenuRequested(QPoint(4, 5));
             module->emitSetCurrentNode();
         }
-        const int n = container->modules().size();
-        QCOMPARE(QList<int>({content.count(), menu.count(), current.count()}), QList<int>({n, n, n}));
+        const QVector<int> heard{content.count(), menu.count(), current.count()};
+        QCOMPARE(heard, QVector<int>(3, container->modules().size()));
 
         // Unloading takes every plugin and module, announced as one reset.
         const QList<QPointer<Plugin>> second = acceptedPlugins(*container);
@@ -197,9 +195,8 @@ private Q_SLOTS:
                  qPrintable(about));
 
         QStringList rows;
-        for (int row = 0; row < model->rowCount(top); ++row)
-            rows.append(model->index(row, 0, top).data().toString() + '|'
-                        + model->index(row, 1, top).data().toString());
+        for (int r = 0; r < model->rowCount(top); ++r)
+            rows.append(model->index(r, 0, top).data().toString() + '|' + model->index(r, 1, top).data().toString());
         QTEST(rows, "modules");
     }
 

@@ -134,7 +134,8 @@ private Q_SLOTS:
                                              << "success, success | off/stopped |  | start nginx, status nginx";
         QTest::newRow("stop fails, force reread")
             << "stop" << true << QByteArray("1")
-            << "fail: Process: \"%P stop nginx\". Exit code: 1.\n\"boom\", success | off/stopped |  | stop nginx, status nginx";
+            << "fail: Process: \"%P stop nginx\". Exit code: 1.\n\"boom\", success | off/stopped |  | "
+               "stop nginx, status nginx";
         // A failed restart or reload reads the state again, even when trusting.
         QTest::newRow("restart fails") << "restart" << false << QByteArray("7")
                                        << "fail: Process: \"%P restart nginx\". Exit code: 7.\n\"boom\", success | "
@@ -162,7 +163,7 @@ private Q_SLOTS:
         const QString actual = QStringList{outcomes.join(QLatin1String(", ")), nginx->state(), editor->hooks.join(' '),
                                            QString(fakes->read(QStringLiteral("calls"))).trimmed().replace('\n', ", ")}
                                    .join(QLatin1String(" | "));
-        const QString pattern = QRegularExpression::escape(expected).replace(QLatin1String("\\%E"), QLatin1String(".+"));
+        const QString pattern = QRegularExpression::escape(expected).replace(QStringLiteral("\\%E"), ".+");
         QVERIFY2(QRegularExpression(QRegularExpression::anchoredPattern(pattern)).match(actual).hasMatch(),
                  qPrintable(actual));
         // The views hear of every change of the shown state.
