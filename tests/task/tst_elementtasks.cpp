@@ -60,11 +60,12 @@ public:
     explicit UsersModule(QStringList *outcomes) : RecordingModule(QStringLiteral("users")), outcomes(outcomes) {}
 
     template <class Base, class... Args>
-    UserTask<Base> *submit(std::function<bool(UserTask<Base> *)> work, Args &&...args)
+    void submit(std::function<bool(UserTask<Base> *)> work, std::function<void(UserTask<Base> *)> after, Args &&...args)
     {
         auto *task = new Probe<UserTask<Base>>(outcomes, std::forward<Args>(args)...);
         task->work = std::move(work);
-        return task;
+        task->after = std::move(after);
+        TaskObserver::instance()->performTask(task);
     }
 
     void performOperation(ContextOperation *context, OperationType type, ElementData *data, int flags) override
@@ -72,49 +73,43 @@ public:
         RecordingModule::performOperation(context, type, data, flags);
         Element *element = context ? context->elementContext() : nullptr;
         const QString name = element ? element->title() : QString();
-        AbstractTask *task = nullptr;
         if (type == ReadPropertyOperation) {
-            task = submit<ReadPropertyHeavyTask>([this, name](auto *t) {
+            submit<ReadPropertyHeavyTask>([this, name](auto *t) {
                 t->data() = new ElementData;
                 t->data()->insert(QStringLiteral("text"), users.value(name));
                 return true;
-            }, element);
+            }, nullptr, element);
         } else if (type == UpdateOperation) {
-            task = submit<UpdateTask>([this, name](auto *t) {
-                if (!failWrites)
-                    users.insert(name, t->data()->value(QStringLiteral("text")).toString());
-                return !failWrites;
-            }, element, data);
+            submit<UpdateTask>([this, name](auto *t) {
+                const QString text = t->data()->value(QStringLiteral("text")).toString();
+                return !failWrites && users.insert(name, text) != users.end();
+            }, nullptr, element, data);
         } else if (type == CreateOperation) {
-            auto *create = submit<CreateTask>([this](auto *t) {
-                if (!failWrites)
-                    users.insert(t->data()->name(), QString());
-                return !failWrites;
-            }, container, data);
             // Without force reread a plugin lists the new element itself.
-            if (!getData(QStringLiteral("paranoid")).toBool())
-                create->after = [this](auto *t) { t->element()->append(newUser(t->data()->name())); };
-            task = create;
+            const bool lists = !getData(QStringLiteral("paranoid")).toBool();
+            submit<CreateTask>([this](auto *t) { return users.insert(t->data()->name(), QString()) != users.end(); },
+                               [this, lists](auto *t) {
+                                   if (lists)
+                                       t->element()->append(newUser(t->data()->name()));
+                               }, container, data);
         } else if (type == ReadContentOperation) {
-            auto *list = submit<ReadContentTask>([](auto *) { return true; }, element);
-            list->data() = data; // the name of a created element, if any
-            list->after = [this](auto *t) {
+            // The record holds the name of a created element, if any.
+            submit<ReadContentTask>([data](auto *t) {
+                t->data() = data;
+                return true;
+            }, [this](auto *t) {
                 t->element()->clearDelete();
                 for (const QString &user : users.keys())
                     t->element()->append(newUser(user));
-            };
-            task = list;
+            }, element);
         } else if (type == DeleteOperation) {
-            task = submit<DeleteTask>([this, name](auto *) { return !failWrites && users.remove(name) == 1; }, element);
-        }
-        if (task)
-            TaskObserver::instance()->performTask(task);
-        else
+            submit<DeleteTask>([this, name](auto *) { return users.remove(name) == 1; }, nullptr, element);
+        } else {
             delete data;
+        }
     }
 
     Element *newUser(const QString &name) { return new Ordinary(*this, rightsYes, QStringLiteral("user"), name); }
-
     QStringList *outcomes;
     Element *container = nullptr;
     // The administered system, changed by tasks while the test waits.
@@ -162,14 +157,10 @@ private Q_SLOTS:
         module->moduleDataRef()->remove(QStringLiteral("paranoid")); // what an earlier run stored
         root = new ElementRootTreeNode(module.get());
         users = new Container(*module, rightsYes, QStringLiteral("users"), QStringLiteral("users"));
-        alice = new Ordinary(*module, rightsYes, QStringLiteral("user"), QStringLiteral("alice"));
-        root->append(users);
-        users->append(alice);
-        module->container = users;
-        editor = new EditWidget(*module, rightsYes, QStringLiteral("user"));
-        creator = new EditWidget(*module, rightsYes, QStringLiteral("users"));
-        module->insertElementWidget(editor);
-        module->insertElementWidget(creator);
+        root->append(module->container = users);
+        users->append(alice = new Ordinary(*module, rightsYes, QStringLiteral("user"), QStringLiteral("alice")));
+        module->insertElementWidget(editor = new EditWidget(*module, rightsYes, QStringLiteral("user")));
+        module->insertElementWidget(creator = new EditWidget(*module, rightsYes, QStringLiteral("users")));
         module->log.clear();
     }
     void cleanup()
@@ -187,55 +178,40 @@ private Q_SLOTS:
         QTest::addColumn<QString>("action"); // edit alice's text, create carol, delete alice
         QTest::addColumn<QString>("forceReread");
         QTest::addColumn<bool>("fails");
-        QTest::addColumn<QString>("trace"); // the module's operations but insertions, then the widget's hooks
-        QTest::addColumn<QList<int>>("reported");
-        QTest::addColumn<QString>("shown"); // the container's elements | the widget's text
-        QTest::addColumn<QString>("madeCurrent");
-        QTest::addColumn<QString>("taskOutcomes");
+        // "<module's operations but insertions, then the widget's hooks> | <states the widget reported> |
+        // <the container's elements> | <the widget's text> | <node made current> | <task outcomes>"
+        QTest::addColumn<QString>("expected");
 
         const QString read = QStringLiteral("ReadProperty(user_alice) Update(user_alice) ");
         const QString reread = read + "ReadProperty(user_alice) read(user_alice) read(user_alice)";
         // Without a stored "false" the update is checked by reading back.
-        QTest::newRow("edit, no force reread value") << "edit" << "absent" << false << reread << QList<int>{3, 0}
-                                                     << "user_alice | drinks coffee" << "" << "success success success";
-        QTest::newRow("edit, trusting") << "edit" << "false" << false << read + "read(user_alice) update"
-                                        << QList<int>{3, 0} << "user_alice | drinks coffee" << "" << "success success";
+        QTest::newRow("edit, no force reread value") << "edit" << "absent" << false << reread
+            + " | 3 0 | user_alice | drinks coffee |  | success success success";
+        QTest::newRow("edit, trusting") << "edit" << "false" << false << read
+            + "read(user_alice) update | 3 0 | user_alice | drinks coffee |  | success success";
         // A failed update is read back too, which shows the system's state.
-        QTest::newRow("edit, force reread, failed") << "edit" << "true" << true << reread << QList<int>{3, 0}
-                                                    << "user_alice | likes tea" << "" << "success fail success";
-        QTest::newRow("edit, trusting, failed keeps the change")
-            << "edit" << "false" << true << read + "read(user_alice)" << QList<int>{3} << "user_alice | drinks coffee"
-            << "" << "success fail";
-
-        // Reading the container again, the plugin replaces the elements it lists.
-        const QString relist = QStringLiteral("Create(widget) ReadContent(users_users) Removed(user_alice)");
+        QTest::newRow("edit, force reread, failed") << "edit" << "true" << true << reread
+            + " | 3 0 | user_alice | likes tea |  | success fail success";
+        QTest::newRow("edit, trusting, failed keeps the change") << "edit" << "false" << true << read
+            + "read(user_alice) | 3 | user_alice | drinks coffee |  | success fail";
         // The plugin lists the new element, and the creation widget is left unchanged.
-        QTest::newRow("create, trusting") << "create" << "false" << false << "Create(widget)" << QList<int>{2, 3, 0}
-                                          << "user_alice user_carol | carol" << "" << "success";
-        // The container is read again and selects the new element by name.
-        QTest::newRow("create, force reread") << "create" << "true" << false << relist << QList<int>{2, 3}
-                                              << "user_alice user_carol | carol" << "user_carol" << "success success";
-        QTest::newRow("create, trusting, failed") << "create" << "false" << true << "Create(widget)" << QList<int>{2, 3}
-                                                  << "user_alice | carol" << "" << "fail";
-
-        QTest::newRow("delete, trusting") << "delete" << "false" << false << "Delete(user_alice) Removed(user_alice)"
-                                          << QList<int>{} << " | " << "users_users" << "success";
+        QTest::newRow("create, trusting") << "create" << "false" << false
+            << "Create(widget) | 2 3 0 | user_alice user_carol | carol |  | success";
+        // The container is read again, its elements replaced, and the new one selected by name.
+        QTest::newRow("create, force reread") << "create" << "true" << false
+            << "Create(widget) ReadContent(users_users) Removed(user_alice) | 2 3 | user_alice user_carol | carol | "
+               "user_carol | success success";
+        QTest::newRow("delete, trusting") << "delete" << "false" << false
+            << "Delete(user_alice) Removed(user_alice) |  |  |  | users_users | success";
         // The element stays until its container is read again.
-        QTest::newRow("delete, force reread") << "delete" << "true" << false << "Delete(user_alice)" << QList<int>{}
-                                              << "user_alice | " << "users_users" << "success";
-        QTest::newRow("delete, trusting, failed") << "delete" << "false" << true << "Delete(user_alice)"
-                                                  << QList<int>{} << "user_alice | " << "" << "fail";
+        QTest::newRow("delete, force reread") << "delete" << "true" << false
+            << "Delete(user_alice) |  | user_alice |  | users_users | success";
     }
     void roundTrips()
     {
         QFETCH(QString, action);
         QFETCH(QString, forceReread);
         QFETCH(bool, fails);
-        QFETCH(QString, trace);
-        QFETCH(QList<int>, reported);
-        QFETCH(QString, shown);
-        QFETCH(QString, madeCurrent);
-        QFETCH(QString, taskOutcomes);
 
         if (forceReread != QLatin1String("absent"))
             module->moduleDataRef()->insert(QStringLiteral("paranoid"), forceReread == QLatin1String("true"));
@@ -245,9 +221,6 @@ private Q_SLOTS:
             editor->setElement(alice, EditElementRole);
             editor->show();
             settle();
-            QCOMPARE(editor->edit->text(), QStringLiteral("likes tea"));
-            QVERIFY(editor->isEnabled());
-            QVERIFY(!editor->isChanged());
             editor->userTypes(QStringLiteral("drinks coffee"));
         } else if (action == QLatin1String("create")) {
             // As the element widget container does for a creation.
@@ -261,55 +234,39 @@ private Q_SLOTS:
             widget->applyContentChanges();
         settle();
 
+        QStringList reported, madeCurrent;
+        for (int state : widget->reported)
+            reported.append(QString::number(state));
+        for (const QList<QVariant> &signal : current)
+            madeCurrent.append(signal.first().value<TreeNode *>()->id());
         const QStringList operations = module->log.filter(QRegularExpression(QStringLiteral("^(?!Inserted)")));
-        QCOMPARE((operations + widget->hooks).join(QLatin1Char(' ')), trace);
-        QCOMPARE(widget->reported, reported);
-        QCOMPARE(widget->isChanged(), !reported.isEmpty() && reported.last() != 0);
-        QCOMPARE(TreeString::fromTree(users) + " | " + widget->edit->text(), shown);
-        QCOMPARE(current.count(), madeCurrent.isEmpty() ? 0 : 1);
-        if (!current.isEmpty())
-            QCOMPARE(current.first().first().value<TreeNode *>()->id(), madeCurrent);
-        QCOMPARE(outcomes.join(QLatin1Char(' ')), taskOutcomes);
+        const QStringList actual{(operations + widget->hooks).join(' '), reported.join(' '),
+                                 TreeString::fromTree(users), widget->edit->text(), madeCurrent.join(' '),
+                                 outcomes.join(' ')};
+        QTEST(actual.join(QLatin1String(" | ")), "expected");
     }
 
-    void printThroughStylesheet_data()
-    {
-        QTest::addColumn<QString>("stylesheet");
-        QTest::addColumn<QString>("xml");
-        QTest::addColumn<QString>("outcome");
-        QTest::addColumn<QString>("shown");
-
-        const QString xml = QStringLiteral("<users><user>alice</user><user>b&amp;b</user></users>");
-        const QString failure = QStringLiteral("fail: Internal error: XML transformation failed");
-        QTest::newRow("transformed") << "report.xsl" << xml << "success" << "alice;b&b;";
-        QTest::newRow("missing stylesheet") << "missing.xsl" << xml << failure << "";
-        QTest::newRow("no stylesheet named") << "" << xml << failure << "";
-        QTest::newRow("broken document") << "report.xsl" << "<users><user>" << failure << "";
-    }
     void printThroughStylesheet()
     {
-        QFETCH(QString, stylesheet);
-        QFETCH(QString, xml);
-        QFETCH(QString, outcome);
-        QFETCH(QString, shown);
-
+        const QString xml = QStringLiteral("<users><user>alice</user><user>b&amp;b</user></users>");
         QTemporaryDir dir;
         QVERIFY(writeFile(dir.filePath(QStringLiteral("report.xsl")), reportSheet));
-        auto *data = new ElementData;
-        data->insert(QStringLiteral("xmlText"), xml);
-        if (!stylesheet.isEmpty())
-            data->insert(QStringLiteral("templateName"), QUrl::fromLocalFile(dir.filePath(stylesheet)).toString());
-
         DialogAnswerer answerer;
         QString previewed;
         answerer.inspect = [&previewed](QDialog *dialog) {
             previewed = dialog->findChild<QTextEdit *>(QStringLiteral("_previewTextEdit"))->toPlainText();
         };
-        TaskObserver::instance()->performTask(new Probe<PrintWidgetTask>(&outcomes, editor, data));
-        settle();
-        QCOMPARE(outcomes, QStringList{outcome});
-        QCOMPARE(answerer.seen, shown.isEmpty() ? QStringList{} : QStringList{"dialog:PreviewDialog"});
-        QCOMPARE(previewed.trimmed(), shown);
+        // Shown in the preview when transformed; a missing stylesheet fails the task, with no preview.
+        for (const QString stylesheet : {"report.xsl", "missing.xsl"}) {
+            auto *data = new ElementData;
+            data->insert(QStringLiteral("xmlText"), xml);
+            data->insert(QStringLiteral("templateName"), QUrl::fromLocalFile(dir.filePath(stylesheet)).toString());
+            TaskObserver::instance()->performTask(new Probe<PrintWidgetTask>(&outcomes, editor, data));
+            settle();
+        }
+        QCOMPARE(outcomes, QStringList({"success", "fail: Internal error: XML transformation failed"}));
+        QCOMPARE(answerer.seen, QStringList{"dialog:PreviewDialog"});
+        QCOMPARE(previewed.trimmed(), QStringLiteral("alice;b&b;"));
     }
 };
 
