@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <cstdlib>
+#include <vector>
 
 namespace {
 
@@ -120,12 +121,6 @@ void rememberRow(const TreeNode *node, int row)
     rowHints.insert(node, row);
 }
 
-bool lessByDepthThenId(const TreeNode *a, const TreeNode *b)
-{
-    if (a->expectedDepth() != b->expectedDepth())
-        return a->expectedDepth() < b->expectedDepth();
-    return a->id() < b->id();
-}
 
 } // namespace
 
@@ -349,9 +344,28 @@ void TreeNode::loadTreeFromList(const QList<TreeNode *> &nodes)
 {
     clear();
 
-    QList<TreeNode *> list = nodes;
-    std::sort(list.begin(), list.end(), lessByDepthThenId);
-    list.prepend(this);
+    // Sorted through a compact array of keys: the comparisons then touch
+    // neither the nodes nor copies of their ids.
+    struct Key
+    {
+        int depth;
+        const QString *id;
+        TreeNode *node;
+    };
+    std::vector<Key> keys;
+    keys.reserve(std::size_t(nodes.size()));
+    for (TreeNode *node : nodes) {
+        if (node)
+            keys.push_back(Key{node->_expectedDepth, &node->_id, node});
+    }
+    std::sort(keys.begin(), keys.end(), [](const Key &a, const Key &b) {
+        return a.depth != b.depth ? a.depth < b.depth : *a.id < *b.id;
+    });
+    QList<TreeNode *> list;
+    list.reserve(int(keys.size()) + 1);
+    list.append(this);
+    for (const Key &key : keys)
+        list.append(key.node);
 
     int currentDepth = _expectedDepth;
     int levelStart = 0;
