@@ -323,8 +323,8 @@ void TreeNodeTest::loadTreeFromList()
     QStringList afterLoad;
     QList<TreeNode *> list;
     QList<TreeNode *> owned;
-    for (const QString &spec : nodes) {
-        const QStringList f = spec.split(QLatin1Char(':'));
+    for (const QString &entry : nodes) {
+        const QStringList f = entry.split(QLatin1Char(':'));
         auto *node = new TestTreeNode(f.at(0), f.at(1).toInt(), f.at(2), &root);
         node->afterLoadLog = &afterLoad;
         list.append(node);
