@@ -5,12 +5,8 @@
 #include "elementtreestring.h"
 #include "screenshot.h"
 
-#include <QLineEdit>
-#include <QPointer>
-#include <QStackedWidget>
-#include <QTabBar>
-#include <QTabWidget>
 #include <QtTest>
+#include <QtWidgets>
 
 #include <memory>
 
@@ -29,6 +25,11 @@ struct SupplementWidget : ElementWidget {
 };
 
 QString nameOf(const Element *element) { return element ? element->title() : QStringLiteral("null"); }
+// "Title(element)", starred when it is the widget on display.
+QString describe(const QString &title, QWidget *w, ElementWidget *current)
+{
+    return title + '(' + nameOf(static_cast<ElementWidget *>(w)->element()) + ')' + (w == current ? "*" : "");
+}
 
 } // namespace
 
@@ -36,15 +37,6 @@ class ElementWidgetContainerTest : public QObject
 {
     Q_OBJECT
 
-private Q_SLOTS:
-    void init();
-    void cleanup();
-    void selecting_data();
-    void selecting();
-    void tabsByClick();
-    void widgetsHandedBack();
-
-private:
     std::unique_ptr<RecordingModule> module;
     std::unique_ptr<ListedRoot> root;
     std::unique_ptr<ElementModel> model;
@@ -52,20 +44,10 @@ private:
     EditWidget *group = nullptr;
     QStringList log;
 
-    template <class W>
-    W *keep(W *widget, const QString &title)
-    {
-        widget->setWindowTitle(title); module->insertElementWidget(widget);
-        return widget;
-    }
     void select(const QString &name, ElementWidgetRole role = EditElementRole)
     {
-        QItemSelection selection;
-        if (!name.isEmpty()) {
-            const QModelIndex index = model->treeNodeToIndex(ElementTreeString::find(root.get(), name));
-            selection.select(index, index);
-        }
-        container->setCurrentElementWidget(selection, role);
+        const QModelIndex index = name.isEmpty() ? QModelIndex() : model->treeNodeToIndex(ElementTreeString::find(root.get(), name));
+        container->setCurrentElementWidget(QItemSelection(index, index), role); // none for an invalid index
     }
     QTabWidget *tabs() const { return container->findChild<QTabWidget *>("_tabWidget"); }
     // "empty", "single[Title(element)]" or "tabs[Title(element) ...]" with
@@ -73,139 +55,110 @@ private:
     QString shown() const
     {
         QStringList widgets;
+        ElementWidget *current = container->currentElementWidget();
         const int page = container->findChild<QStackedWidget *>("_stackedWidget")->currentIndex();
         for (int i = 0; page == 1 && i < tabs()->count(); ++i)
-            widgets.append(tabs()->tabText(i) + '(' + nameOf(static_cast<ElementWidget *>(tabs()->widget(i))->element())
-                           + ')' + (tabs()->widget(i) == container->currentElementWidget() ? "*" : ""));
+            widgets.append(describe(tabs()->tabText(i), tabs()->widget(i), current));
         if (page == 2)
-            widgets.append(container->currentElementWidget()->windowTitle() + '('
-                           + nameOf(container->currentElementWidget()->element()) + ")*");
+            widgets.append(describe(current->windowTitle(), current, current));
         const QString caption = container->findChild<QLineEdit *>("_captionLineEdit")->text();
         const QString form = page == 0 ? "empty%1" : page == 1 ? "tabs[%1]" : "single[%1]";
         return form.arg(widgets.join(' ')) + (caption.isEmpty() ? QString() : " caption=" + caption);
     }
-};
 
-void ElementWidgetContainerTest::init()
-{
-    module.reset(new RecordingModule(QStringLiteral("users")));
-    root.reset(new ListedRoot(3));
-    ElementTreeString::build(*module, root.get(),
-                             "staff:group[alice s1:extra s2:note s3:other] lone:solo[t1:extra t2:note t4:memo] bob ~plain");
-    model.reset(new ElementModel(root.get()));
-    group = keep(new EditWidget(*module, rightsYes, "group"), "Group");
-    keep(new EditWidget(*module, rightsYes, "user"), "User");
-    keep(new SupplementWidget(*module, "extra", "group", 800), "Extra");
-    keep(new SupplementWidget(*module, "note", ContextOperation::allElementType, 100), "Note");
-    keep(new SupplementWidget(*module, "memo", ContextOperation::allElementType, 300), "Memo");
-    keep(new SupplementWidget(*module, "other", "host", 50), "Other");
-
-    container = new ElementWidgetContainer2;
-    container->resize(480, 320);
-    container->show();
-    QVERIFY(QTest::qWaitForWindowExposed(container));
-    connect(container, &ElementWidgetContainer2::elementContextOperationChanged, this,
-            [this](Element *e) { log.append("context(" + nameOf(e) + ')'); });
-    connect(container, &ElementWidgetContainer2::elementWidgetChanged, this,
-            [this](ElementWidget *w) { log.append("widget(" + (w ? w->windowTitle() : "null") + ')'); });
-    connect(root.get(), &TreeNode::setCurrentNode, this,
-            [this](TreeNode *n) { log.append("current(" + nameOf(qobject_cast<Element *>(n)) + ')'); });
-}
-
-void ElementWidgetContainerTest::cleanup()
-{
-    delete container;
-    log.clear();
-    model.reset();
-    module.reset(); // with the widgets, before the elements they point at
-    root.reset();
-}
-
-void ElementWidgetContainerTest::selecting_data()
-{
-    QTest::addColumn<QString>("before");
-    QTest::addColumn<QString>("name");
-    QTest::addColumn<int>("role");
-    QTest::addColumn<QString>("expected");
-    QTest::addColumn<QStringList>("signals");
-    const QStringList cleared{"context(null)", "widget(null)"};
-    const QString staffTabs("tabs[Note(s2) Group(staff)* Extra(s1)] caption=staff");
-
-    // The element's own widget and the supplements of its type or of any
-    // type, by priority; "other" stands for another type, alice is no supplement.
-    QTest::newRow("own widget and supplements") << "" << "staff" << 1 << staffTabs
-                                                << QStringList{"context(staff)", "widget(Group)"};
-    QTest::newRow("supplement: its parent's set") << "bob" << "s1" << 1 << staffTabs
-                                                  << cleared + QStringList{"context(staff)", "widget(Group)"};
-    QTest::newRow("shown tab's element: switch only")
-        << "staff" << "s2" << 1 << "tabs[Note(s2)* Group(staff) Extra(s1)] caption=staff"
-        << QStringList{"current(s2)", "context(s2)", "widget(Note)"};
-    QTest::newRow("current tab's element: nothing") << "staff" << "staff" << 1 << staffTabs << QStringList();
-    QTest::newRow("no own widget: supplements of any type")
-        << "" << "lone" << 1 << "tabs[Note(t2)* Memo(t4)] caption=lone"
-        << QStringList{"context(t2)", "widget(Note)"};
-    QTest::newRow("single widget") << "staff" << "bob" << 1 << "single[User(bob)*] caption=bob"
-                                   << cleared + QStringList{"context(bob)", "widget(User)"};
-    QTest::newRow("create") << "staff" << "bob" << 2 << "single[User(null)*]" << cleared + QStringList{"widget(User)"};
-    QTest::newRow("empty selection") << "staff" << "" << 1 << "empty" << cleared;
-}
-
-void ElementWidgetContainerTest::selecting()
-{
-    QFETCH(QString, before);
-    QFETCH(QString, name);
-    QFETCH(int, role);
-    if (!before.isEmpty())
-        select(before);
-    log.clear();
-    select(name, ElementWidgetRole(role));
-    QTEST(shown(), "expected");
-    QTEST(log, "signals");
-    auto *user = static_cast<EditWidget *>(module->elementWidget("user"));
-    QCOMPARE(user->hooks.contains("beforeCreation"), role == 2 && name == "bob");
-}
-
-void ElementWidgetContainerTest::tabsByClick()
-{
-    select("staff");
-    log.clear();
-    QTabBar *bar = tabs()->tabBar();
-    QTest::mouseClick(bar, Qt::LeftButton, {}, bar->tabRect(2).center());
-    QCOMPARE(log, (QStringList{"current(s1)", "context(s1)", "widget(Extra)"}));
-    QVERIFY(keepScreenshot(container, QStringLiteral("elementwidgetcontainer2")));
-
-    // Tabs other than the current one are locked, e.g. while changes wait.
-    container->enableTabChange(false);
-    QTest::mouseClick(bar, Qt::LeftButton, {}, bar->tabRect(0).center());
-    QCOMPARE(container->currentElementWidget()->windowTitle(), QStringLiteral("Extra"));
-    QVERIFY(bar->isTabEnabled(2) && !bar->isTabEnabled(1));
-}
-
-void ElementWidgetContainerTest::widgetsHandedBack()
-{
-    select("staff");
-    QVERIFY(group->isVisible());
-    // The widget on display is relayed, until it is handed back.
-    log.clear();
-    Q_EMIT group->elementContextOperationChanged(nullptr);
-    QCOMPARE(log, QStringList{"context(null)"});
-
-    select("bob");
-    for (const char *type : {"group", "extra", "note"}) {
-        ElementWidget *widget = module->elementWidget(type);
-        QVERIFY2(widget && !widget->parent() && !widget->element() && widget->role() == NoElementRole, type);
+private Q_SLOTS:
+    void init()
+    {
+        module.reset(new RecordingModule(QStringLiteral("users")));
+        root.reset(new ListedRoot(3));
+        ElementTreeString::build(*module, root.get(),
+                                 "staff:group[alice s1:extra s2:note s3:other] lone:solo[t1:extra t2:note t4:memo] bob ~plain");
+        model.reset(new ElementModel(root.get()));
+        auto keep = [this](auto *widget, const char *title) { widget->setWindowTitle(QLatin1String(title)); module->insertElementWidget(widget); return widget; };
+        group = keep(new EditWidget(*module, rightsYes, "group"), "Group");
+        keep(new EditWidget(*module, rightsYes, "user"), "User");
+        keep(new SupplementWidget(*module, "extra", "group", 800), "Extra");
+        keep(new SupplementWidget(*module, "note", ContextOperation::allElementType, 100), "Note");
+        keep(new SupplementWidget(*module, "memo", ContextOperation::allElementType, 300), "Memo");
+        keep(new SupplementWidget(*module, "other", "host", 50), "Other");
+        container = new ElementWidgetContainer2;
+        container->resize(480, 320);
+        container->show();
+        QVERIFY(QTest::qWaitForWindowExposed(container));
+        connect(container, &ElementWidgetContainer2::elementContextOperationChanged, this,
+                [this](Element *e) { log.append("context(" + nameOf(e) + ')'); });
+        connect(container, &ElementWidgetContainer2::elementWidgetChanged, this,
+                [this](ElementWidget *w) { log.append("widget(" + (w ? w->windowTitle() : "null") + ')'); });
+        connect(root.get(), &TreeNode::setCurrentNode, this,
+                [this](TreeNode *n) { log.append("current(" + nameOf(qobject_cast<Element *>(n)) + ')'); });
     }
-    QVERIFY(group->isEditBlocked());
-    log.clear();
-    Q_EMIT group->elementContextOperationChanged(nullptr);
-    QVERIFY(log.isEmpty());
+    void cleanup()
+    {
+        delete container;
+        model.reset();
+        module.reset(); // with the widgets, before the elements they point at
+        root.reset();
+    }
 
-    // The widget on display outlives the container, free of it.
-    QPointer<ElementWidget> user = module->elementWidget("user");
-    delete container;
-    container = nullptr;
-    QVERIFY(user && !user->parent() && !user->element());
-}
+    void selecting_data()
+    {
+        QTest::addColumn<QString>("before");
+        QTest::addColumn<QString>("name");
+        QTest::addColumn<int>("role");
+        QTest::addColumn<QString>("expected");
+        QTest::addColumn<QStringList>("signals");
+        const QStringList cleared{"context(null)", "widget(null)"};
+        const QString staffTabs("tabs[Note(s2) Group(staff)* Extra(s1)] caption=staff");
+
+        // The element's own widget and the supplements of its type or of any
+        // type, by priority; "other" stands for another type, alice is no supplement.
+        QTest::newRow("own widget and supplements") << "" << "staff" << 1 << staffTabs
+                                                    << QStringList{"context(staff)", "widget(Group)"};
+        QTest::newRow("supplement: its parent's set") << "bob" << "s1" << 1 << staffTabs
+                                                      << cleared + QStringList{"context(staff)", "widget(Group)"};
+        QTest::newRow("no own widget: supplements of any type")
+            << "" << "lone" << 1 << "tabs[Note(t2)* Memo(t4)] caption=lone" << QStringList{"context(t2)", "widget(Note)"};
+        QTest::newRow("single widget") << "staff" << "bob" << 1 << "single[User(bob)*] caption=bob"
+                                       << cleared + QStringList{"context(bob)", "widget(User)"};
+        QTest::newRow("create") << "staff" << "bob" << 2 << "single[User(null)*]" << cleared + QStringList{"widget(User)"};
+        QTest::newRow("empty selection") << "staff" << "" << 1 << "empty" << cleared;
+    }
+    void selecting()
+    {
+        QFETCH(QString, before);
+        QFETCH(QString, name);
+        QFETCH(int, role);
+        if (!before.isEmpty())
+            select(before);
+        log.clear();
+        select(name, ElementWidgetRole(role));
+        QTEST(shown(), "expected");
+        QTEST(log, "signals");
+        QCOMPARE(static_cast<EditWidget *>(module->elementWidget("user"))->hooks.contains("beforeCreation"), role == 2);
+    }
+
+    void tabsAndHandingBack()
+    {
+        select("staff");
+        log.clear();
+        QTabBar *bar = tabs()->tabBar();
+        QTest::mouseClick(bar, Qt::LeftButton, {}, bar->tabRect(2).center());
+        QCOMPARE(log, (QStringList{"current(s1)", "context(s1)", "widget(Extra)"}));
+        QVERIFY(keepScreenshot(container, QStringLiteral("elementwidgetcontainer2")));
+        // Tabs other than the current one are locked, e.g. while changes wait.
+        container->enableTabChange(false);
+        QTest::mouseClick(bar, Qt::LeftButton, {}, bar->tabRect(0).center());
+        QCOMPARE(container->currentElementWidget()->windowTitle(), QStringLiteral("Extra"));
+
+        // Selecting another element hands the widgets back to the module.
+        select("bob");
+        for (const char *type : {"group", "extra", "note"}) {
+            ElementWidget *widget = module->elementWidget(type);
+            QVERIFY2(widget && !widget->parent() && !widget->element() && widget->role() == NoElementRole, type);
+        }
+        QVERIFY(group->isEditBlocked());
+    }
+};
 
 QTEST_MAIN(ElementWidgetContainerTest)
 #include "tst_elementwidgetcontainer.moc"

@@ -8,24 +8,18 @@
 #include <QtTest>
 
 #include <memory>
-#include <utility>
 
 using Tester = QAbstractItemModelTester;
 
 namespace {
 
-QStringList destroyedRecords; // names of records as they are destroyed
 int liveRecords = 0;
 
 // A host entry: name, address and a comment column that cannot be edited;
 // valid when it has both a name and an address. "_" names an empty one.
-class HostRecord : public Record
-{
-public:
-    explicit HostRecord(const QString &name = {}, const QString &address = {})
-        : name(name), address(address) { ++liveRecords; }
-    ~HostRecord() override { --liveRecords; destroyedRecords.append(name.isEmpty() ? QStringLiteral("_") : name); }
-
+struct HostRecord : Record {
+    explicit HostRecord(const QString &name = {}, const QString &address = {}) : name(name), address(address) { ++liveRecords; }
+    ~HostRecord() override { --liveRecords; }
     bool isEmpty() const override { return name.isEmpty() && address.isEmpty(); }
     bool isValid() const override { return !name.isEmpty() && !address.isEmpty(); }
     bool isEditable(int column) const override { return column < 2; }
@@ -43,22 +37,16 @@ public:
         setChanged();
         return true;
     }
-
     QString name, address;
 };
-
-int threeColumns() { return 3; }
-Record *newHost() { return new HostRecord; }
-QVariant hostHeader(int section) { return QStringLiteral("NAC").at(section); } // no bounds check: the model must not ask
 
 // "a b _": records named a and b (address 10.0.0.n) and an empty one.
 QList<Record *> records(const QString &description)
 {
     QList<Record *> result;
-    for (const QString &name : description.split(QLatin1Char(' '), Qt::SkipEmptyParts)) {
-        const QString address = QStringLiteral("10.0.0.%1").arg(result.size() + 1);
-        result.append(name == QLatin1String("_") ? new HostRecord : new HostRecord(name, address));
-    }
+    for (const QString &name : description.split(QLatin1Char(' '), Qt::SkipEmptyParts))
+        result.append(name == QLatin1String("_") ? new HostRecord
+                                                 : new HostRecord(name, QStringLiteral("10.0.0.%1").arg(result.size() + 1)));
     return result;
 }
 
@@ -68,8 +56,7 @@ QString rows(const QAbstractItemModel &model)
     QStringList result;
     for (int row = 0; row < model.rowCount(); ++row)
         result.append(model.index(row, 0).data().toString());
-    result.replaceInStrings(QRegularExpression(QStringLiteral("^$")), QStringLiteral("_"));
-    return result.join(QLatin1Char(' '));
+    return result.replaceInStrings(QRegularExpression(QStringLiteral("^$")), QStringLiteral("_")).join(QLatin1Char(' '));
 }
 
 const QStringList resetSignals{"aboutToReset", "reset"};
@@ -80,15 +67,19 @@ class RecordsTest : public QObject
 {
     Q_OBJECT
 
+    std::unique_ptr<RecordModel> model;
+    std::unique_ptr<Tester> tester;
+    SignalLog *log = nullptr;
+
 private Q_SLOTS:
     void init()
     {
-        destroyedRecords.clear();
-        model.reset(new RecordModel(threeColumns, hostHeader, newHost));
+        // No bounds check in the header function: the model must not ask beyond the columns.
+        model.reset(new RecordModel([] { return 3; }, [](int section) -> QVariant { return QStringLiteral("NAC").at(section); },
+                                    []() -> Record * { return new HostRecord; }));
         tester.reset(new Tester(model.get(), Tester::FailureReportingMode::QtTest));
         (log = new SignalLog(model.get()))->watchModel(model.get());
     }
-
     void cleanup()
     {
         tester.reset();
@@ -98,27 +89,18 @@ private Q_SLOTS:
 
     void ownership()
     {
-        auto destroyed = [] { return std::exchange(destroyedRecords, {}).join(QLatin1Char(' ')); };
         model->setRecordList(records(QStringLiteral("a b")));
         model->setRecordList(records(QStringLiteral("c d")));
-        QCOMPARE(destroyed(), QStringLiteral("a b"));
+        QCOMPARE(liveRecords, 2);
         model->clear();
-        QCOMPARE(destroyed(), QStringLiteral("c d"));
+        QCOMPARE(liveRecords, 0);
         QCOMPARE(log->take(), resetSignals + resetSignals + resetSignals);
-
-        // Taken records belong to the caller.
-        model->setRecordList(records(QStringLiteral("e")));
-        qDeleteAll(model->takeRecordList());
-        QVERIFY(model->rowCount() == 0);
-
         // A record given back with the model's own list stays alive, and is held once.
         model->setRecordList(records(QStringLiteral("f g")));
         const QList<Record *> own = model->getRecordList();
         model->setRecordList({own.at(1), own.at(1), nullptr});
         model->appendRecordList({own.at(1), nullptr});
-        QCOMPARE(destroyed(), QStringLiteral("e f"));
-        QCOMPARE(rows(*model), QStringLiteral("g"));
-        // cleanup() checks that the destructor deletes the rest.
+        QVERIFY(rows(*model) == QStringLiteral("g") && liveRecords == 1); // cleanup() checks that the destructor deletes it
     }
 
     void rowEdits_data()
@@ -126,31 +108,20 @@ private Q_SLOTS:
         QTest::addColumn<QString>("table");
         QTest::addColumn<QString>("edit"); // "+row,count" inserts rows, "-row,count" removes them, else appends
         QTest::addColumn<QString>("expected"); // the same table when the edit is refused
-
         QTest::newRow("insert in the middle") << "a b" << "+1,2" << "a _ _ b";
-        QTest::newRow("insert at a negative row") << "a b" << "+-1,1" << "a b";
         QTest::newRow("remove in the middle") << "a b c d" << "-1,2" << "a d";
-        QTest::newRow("remove more than there is") << "a" << "-0,2" << "a";
         QTest::newRow("append below the last filled row") << "a _ _" << "x y" << "a x y _ _";
-        QTest::newRow("append; empty rows in between stay") << "a _ b _" << "x" << "a _ b x _";
     }
-
     void rowEdits()
     {
         QFETCH(QString, table);
         QFETCH(QString, edit);
         QFETCH(QString, expected);
-
         model->setRecordList(records(table));
-        const int row = edit.mid(1).section(QLatin1Char(','), 0, 0).toInt();
-        const int count = edit.section(QLatin1Char(','), 1).toInt();
-        bool accepted = true;
-        if (edit.startsWith(QLatin1Char('+')))
-            accepted = model->insertRows(row, count);
-        else if (edit.startsWith(QLatin1Char('-')))
-            accepted = model->removeRows(row, count);
-        else
-            model->appendRecordList(records(edit));
+        const int row = edit.mid(1).section(QLatin1Char(','), 0, 0).toInt(), count = edit.section(QLatin1Char(','), 1).toInt();
+        const bool accepted = edit[0] == '+' ? model->insertRows(row, count)
+                            : edit[0] == '-' ? model->removeRows(row, count)
+                                             : (model->appendRecordList(records(edit)), true);
         QCOMPARE(accepted, expected != table);
         QCOMPARE(rows(*model), expected);
         QCOMPARE(liveRecords, model->rowCount()); // removed rows are deleted, and only those
@@ -164,53 +135,31 @@ private Q_SLOTS:
         QVERIFY(model->allRecordsValid() && model->setData(address, QStringLiteral("192.168.1.1")));
         // The whole row is announced: one cell may change how the others look.
         QCOMPARE(log->take(), QStringList{"changed(b:0, b:2)"});
-
         // Refused by the record or by the model, silently.
         QVERIFY(!model->setData(address, QStringLiteral("not an address")));
         QVERIFY(!model->setData(model->index(1, 2), QStringLiteral("comment")));
-        QVERIFY(!model->setData(address, QStringLiteral("1.1.1.1"), Qt::DisplayRole));
         QVERIFY(log->entries.isEmpty());
         QVERIFY(model->insertRows(2, 1) && !model->allRecordsValid());
-
-        QVERIFY(model->flags(address) & Qt::ItemIsEditable);
+        // Disabling resets the model once and makes every cell read-only.
         model->setEnabled(false);
         model->setEnabled(false);
         QCOMPARE(log->take().mid(2), resetSignals);
         QVERIFY(!(model->flags(address) & Qt::ItemIsEditable));
         QCOMPARE(model->headerData(0, Qt::Vertical).toInt(), 1); // rows count from 1
-        // The header function is never asked beyond the columns it knows.
         QVERIFY(!model->headerData(-1, Qt::Horizontal).isValid() && !model->headerData(3, Qt::Horizontal).isValid());
-    }
-
-    void filter_data()
-    {
-        QTest::addColumn<QString>("pattern");
-        QTest::addColumn<QString>("expected");
-
-        // Rows: a 10.0.0.1 "host a", bb 10.0.0.2 "host bb", c 10.0.0.3 "host c".
-        QTest::newRow("invalid pattern") << "(" << "a bb c";
-        QTest::newRow("second column") << "0\\.3$" << "c";
-        QTest::newRow("third column, key column ignored") << "host a" << "a";
     }
 
     void filter()
     {
-        QFETCH(QString, pattern);
-        QFETCH(QString, expected);
-
-        model->setRecordList(records(QStringLiteral("a bb c")));
+        // The pattern is searched in every column, whatever the key column.
+        model->setRecordList(records(QStringLiteral("a bb c"))); // at 10.0.0.1 to 10.0.0.3
         RecordSortFilterProxyModel proxy;
         proxy.setSourceModel(model.get());
         Tester proxyTester(&proxy, Tester::FailureReportingMode::QtTest);
         proxy.setFilterKeyColumn(0);
-        proxy.setFilterRegExp(QRegExp(pattern));
-        QCOMPARE(rows(proxy), expected);
+        proxy.setFilterRegExp(QRegExp(QStringLiteral("0\\.1$|host c")));
+        QCOMPARE(rows(proxy), QStringLiteral("a c"));
     }
-
-private:
-    std::unique_ptr<RecordModel> model;
-    std::unique_ptr<Tester> tester;
-    SignalLog *log = nullptr;
 };
 
 QTEST_GUILESS_MAIN(RecordsTest)
