@@ -20,7 +20,6 @@ class ThreadTest : public QObject
 
 private Q_SLOTS:
     void initTestCase();
-    void putRefusedWithoutWorkers();
     void ringHolds64BesidesRunningTask();
     void destroyingOneStopsAll();
     void queuedTasksDeletedAtStop();
@@ -32,10 +31,13 @@ private:
     TestTask::Counters running, queued;
     QSemaphore gate;
 
-    // Starts the worker, keeps it busy with a task waiting at the gate and fills
-    // the 64 slots of the ring behind it; one more task is refused.
+    // A worker not started yet opens no slot. Once started, it is kept busy with a
+    // task waiting at the gate and the 64 slots of the ring behind it are filled;
+    // one more task is refused.
     void fillRing()
     {
+        TestTask early(nullptr, QStringLiteral("early"));
+        QVERIFY(!Thread::put(&early) && !Thread::put(nullptr));
         worker->start();
         // The worker opens the ring a moment later, in its own thread.
         auto *blocker = new TestTask(&running, QStringLiteral("blocker"), TaskDescription::Success, &gate);
@@ -56,14 +58,6 @@ void ThreadTest::initTestCase()
                                               QAbstractItemModelTester::FailureReportingMode::QtTest));
 }
 
-void ThreadTest::putRefusedWithoutWorkers()
-{
-    // The worker is created, not started: it opens no slot.
-    TestTask task(&queued, QStringLiteral("t"));
-    QVERIFY(!Thread::put(&task));
-    QVERIFY(!Thread::put(nullptr));
-}
-
 void ThreadTest::ringHolds64BesidesRunningTask()
 {
     fillRing();
@@ -79,11 +73,10 @@ void ThreadTest::ringHolds64BesidesRunningTask()
 
 void ThreadTest::destroyingOneStopsAll()
 {
-    QList<Thread *> workers;
+    QList<Thread *> workers{new Thread, new Thread, new Thread};
     for (int i = 0; i < 3; ++i) {
-        workers.append(new Thread);
-        workers.last()->start();
-        QTRY_COMPARE(workers.last()->threadIndex(), i);
+        workers[i]->start();
+        QTRY_COMPARE(workers[i]->threadIndex(), i);
     }
     delete workers.takeAt(1);
     for (Thread *w : workers)
