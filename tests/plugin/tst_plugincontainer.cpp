@@ -147,7 +147,6 @@ private Q_SLOTS:
         QTest::newRow("accepted") << "valid.so" << "valid plugin" << "The plugin valid plugin"
                                   << QStringList{"alpha|alpha module", "|", "alpha-child|alpha-child module"};
         QTest::newRow("not valid") << "invalid.so" << "" << "The plugin cannot work on this system." << QStringList();
-        QTest::newRow("another interface") << "otherinterface.so" << "" << "brel-admin-kvt/0.0" << QStringList();
         QTest::newRow("not a shared object") << "broken.so" << "" << "broken.so" << QStringList();
     }
 

@@ -23,53 +23,46 @@ using Ordinary = TestElement<OrdinaryElement>;
 
 namespace {
 
-// A plugin's task: run() does its work, which fails the task when it returns false.
+// A plugin's task: run() does its work on the task's record, which fails the
+// task when it returns false.
 template <class Base>
 class UserTask : public Base
 {
 public:
-    using Base::Base;
+    template <class... Args>
+    UserTask(std::function<bool(ElementData *&)> work, Args... args) : Base(args...), work(std::move(work))
+    {
+    }
     void run() override
     {
-        this->taskDescription().setStatus(work(this) ? TaskDescription::Success : TaskDescription::Fail);
+        this->taskDescription().setStatus(work(this->_elementData) ? TaskDescription::Success : TaskDescription::Fail);
         AbstractTask::run();
     }
-    ElementData *&data() { return this->_elementData; }
-
-    std::function<bool(UserTask *)> work;
+    std::function<bool(ElementData *&)> work;
 };
 
-// A plugin's module administering user names with a text each: every
-// operation becomes a task.
+// A plugin's module administering user names with a text each: reading and
+// updating an element are tasks.
 class UsersModule : public RecordingModule
 {
 public:
     explicit UsersModule(QStringList *outcomes) : RecordingModule(QStringLiteral("users")), outcomes(outcomes) {}
-
-    template <class Base, class... Args>
-    void submit(std::function<bool(UserTask<Base> *)> work, Args &&...args)
-    {
-        auto *task = new Probe<UserTask<Base>>(outcomes, std::forward<Args>(args)...);
-        task->work = std::move(work);
-        TaskObserver::instance()->performTask(task);
-    }
 
     void performOperation(ContextOperation *context, OperationType type, ElementData *data, int flags) override
     {
         RecordingModule::performOperation(context, type, data, flags);
         Element *element = context ? context->elementContext() : nullptr;
         const QString name = element ? element->title() : QString();
+        const QLatin1String text("text");
         if (type == ReadPropertyOperation) {
-            submit<ReadPropertyHeavyTask>([this, name](auto *t) {
-                t->data() = new ElementData;
-                t->data()->insert(QStringLiteral("text"), users.value(name));
+            TaskObserver::instance()->performTask(new Probe<UserTask<ReadPropertyHeavyTask>>(outcomes, [=](ElementData *&read) {
+                (read = new ElementData)->insert(text, users.value(name));
                 return true;
-            }, element);
+            }, element));
         } else if (type == UpdateOperation) {
-            submit<UpdateTask>([this, name](auto *t) {
-                const QString text = t->data()->value(QStringLiteral("text")).toString();
-                return !failWrites && users.insert(name, text) != users.end();
-            }, element, data);
+            TaskObserver::instance()->performTask(new Probe<UserTask<UpdateTask>>(outcomes, [=](ElementData *&written) {
+                return !failWrites && users.insert(name, written->value(text).toString()) != users.end();
+            }, element, data));
         } else {
             delete data;
         }
