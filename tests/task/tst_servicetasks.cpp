@@ -5,7 +5,6 @@
 #include <kvt-common/serviceelement.h>
 #include <kvt-common/servicelightelementdata.h>
 #include <kvt-common/startservicetask.h>
-#include <kvt-common/stopservicetask.h>
 #include <kvt-common/taskobserverdialog.h>
 
 #include "../system/systemtest.h"
@@ -113,50 +112,36 @@ private Q_SLOTS:
     void serviceCommands_data()
     {
         QTest::addColumn<QString>("command");
-        QTest::addColumn<bool>("forceReread");
-        QTest::addColumn<QByteArray>("code"); // "missing": the program is not there
+        QTest::addColumn<QByteArray>("code");
         // "<task outcomes> | <service state> | <editor hooks> | <command lines run>", with
         // "%P" for the program and "%E" for the toolkit's error text.
         QTest::addColumn<QString>("expected");
 
         // The status program says "stopped" (3) throughout, so a re-read shows.
-        QTest::newRow("status of a running service") << "status" << false << QByteArray("0")
+        QTest::newRow("status of a running service") << "status" << QByteArray("0")
                                                      << "success | on/started |  | status nginx";
         QTest::newRow("status program crashes")
-            << "status" << false << QByteArray("crash")
+            << "status" << QByteArray("crash")
             << "fail: Process: \"%P status nginx\". Error: %E.\n\"Not finished\" | off/unknown |  | status nginx";
-        QTest::newRow("program missing") << "stop" << false << QByteArray("missing")
-                                         << "fail: Process: \"%P stop nginx\". Error: %E.\n\"Not started\" | "
-                                            "off/unknown |  | ";
-        QTest::newRow("start") << "start" << false << QByteArray("0")
+        QTest::newRow("start") << "start" << QByteArray("0")
                                << "success | on/started | read(service_nginx) | start nginx";
-        QTest::newRow("start, force reread") << "start" << true << QByteArray("0")
-                                             << "success, success | off/stopped |  | start nginx, status nginx";
-        QTest::newRow("stop fails, force reread")
-            << "stop" << true << QByteArray("1")
-            << "fail: Process: \"%P stop nginx\". Exit code: 1.\n\"boom\", success | off/stopped |  | "
-               "stop nginx, status nginx";
         // A failed restart or reload reads the state again, even when trusting.
-        QTest::newRow("restart fails") << "restart" << false << QByteArray("7")
+        QTest::newRow("restart fails") << "restart" << QByteArray("7")
                                        << "fail: Process: \"%P restart nginx\". Exit code: 7.\n\"boom\", success | "
                                           "off/stopped |  | restart nginx, status nginx";
     }
     void serviceCommands()
     {
         QFETCH(QString, command);
-        QFETCH(bool, forceReread);
         QFETCH(QByteArray, code);
         QFETCH(QString, expected);
 
-        module->moduleDataRef()->insert(QStringLiteral("paranoid"), forceReread);
+        module->moduleDataRef()->insert(QStringLiteral("paranoid"), false);
         writeFile(fakes->filePath(QStringLiteral("status.code")), command == "status" ? code : "3");
         writeFile(fakes->filePath(command + ".code"), code);
         ServiceTask *task = command == "status" ? nginx->probe<ReadPropertyLightServiceTask>()
             : command == "start"                ? nginx->probe<StartServiceTask>()
-            : command == "stop"                 ? nginx->probe<StopServiceTask>()
                                                 : nginx->probe<RestartServiceTask>();
-        if (code == "missing")
-            task->setProgram(fakes->filePath(QStringLiteral("missing")));
         expected.replace(QLatin1String("%P"), task->program());
         QSignalSpy changed(nginx, SIGNAL(nodeDataChanged(TreeNode *)));
         run(task);

@@ -18,24 +18,18 @@ class ThreadTest : public QObject
 {
     Q_OBJECT
 
-private Q_SLOTS:
-    void initTestCase();
-    void putRefusedWithoutWorkers();
-    void ringHolds64BesidesRunningTask();
-    void destroyingOneStopsAll();
-    void queuedTasksDeletedAtStop();
-    void observerReportsRefusedTask();
-
-private:
     std::unique_ptr<QAbstractItemModelTester> tester;
     std::unique_ptr<Thread> worker{new Thread}; // not started yet
     TestTask::Counters running, queued;
     QSemaphore gate;
 
-    // Starts the worker, keeps it busy with a task waiting at the gate and fills
-    // the 64 slots of the ring behind it; one more task is refused.
+    // A worker not started yet opens no slot. Once started, it is kept busy with a
+    // task waiting at the gate and the 64 slots of the ring behind it are filled;
+    // one more task is refused.
     void fillRing()
     {
+        TestTask early(nullptr, QStringLiteral("early"));
+        QVERIFY(!Thread::put(&early) && !Thread::put(nullptr));
         worker->start();
         // The worker opens the ring a moment later, in its own thread.
         auto *blocker = new TestTask(&running, QStringLiteral("blocker"), TaskDescription::Success, &gate);
@@ -47,86 +41,78 @@ private:
         TestTask refused(nullptr, QStringLiteral("65th"));
         QVERIFY(!Thread::put(&refused));
     }
-};
 
-void ThreadTest::initTestCase()
-{
-    // Tasks report to the observer, which must live in this thread.
-    tester.reset(new QAbstractItemModelTester(TaskObserver::instance()->model(),
-                                              QAbstractItemModelTester::FailureReportingMode::QtTest));
-}
-
-void ThreadTest::putRefusedWithoutWorkers()
-{
-    // The worker is created, not started: it opens no slot.
-    TestTask task(&queued, QStringLiteral("t"));
-    QVERIFY(!Thread::put(&task));
-    QVERIFY(!Thread::put(nullptr));
-}
-
-void ThreadTest::ringHolds64BesidesRunningTask()
-{
-    fillRing();
-    QCOMPARE(worker->threadIndex(), 0);
-    gate.release();
-    QTRY_COMPARE(int(queued.afterRuns), Thread::BufferSize);
-    QCOMPARE(int(queued.destroyed), Thread::BufferSize);
-    QCOMPARE(int(running.destroyed), 1);
-    // Slots are free again.
-    QVERIFY(Thread::put(new TestTask(&queued, QStringLiteral("again"))));
-    QTRY_COMPARE(int(queued.destroyed), Thread::BufferSize + 1);
-}
-
-void ThreadTest::destroyingOneStopsAll()
-{
-    QList<Thread *> workers;
-    for (int i = 0; i < 3; ++i) {
-        workers.append(new Thread);
-        workers.last()->start();
-        QTRY_COMPARE(workers.last()->threadIndex(), i);
+private Q_SLOTS:
+    void initTestCase()
+    {
+        // Tasks report to the observer, which must live in this thread.
+        tester.reset(new QAbstractItemModelTester(TaskObserver::instance()->model(),
+                                                  QAbstractItemModelTester::FailureReportingMode::QtTest));
     }
-    delete workers.takeAt(1);
-    for (Thread *w : workers)
-        QVERIFY(w->wait(5000));
-    qDeleteAll(workers);
-}
 
-void ThreadTest::queuedTasksDeletedAtStop()
-{
-    fillRing();
-    // The destructor waits for the worker, which waits for the gate: open it
-    // from elsewhere once the stop has been requested.
-    std::thread opener([this] {
-        std::this_thread::sleep_for(std::chrono::milliseconds(100));
+    void ringHolds64BesidesRunningTask()
+    {
+        fillRing();
+        QCOMPARE(worker->threadIndex(), 0);
         gate.release();
-    });
-    worker.reset();
-    opener.join();
-    // The full ring is emptied: no waiting task ran, all were deleted. The
-    // running task finished and reports as usual.
-    QCOMPARE(int(queued.runs), 0);
-    QCOMPARE(int(queued.destroyed), Thread::BufferSize);
-    QTRY_COMPARE(int(running.destroyed), 1);
-    QCOMPARE(int(running.afterRuns), 1);
-}
+        QTRY_COMPARE(int(queued.afterRuns), Thread::BufferSize);
+        QCOMPARE(int(queued.destroyed), Thread::BufferSize);
+        QCOMPARE(int(running.destroyed), 1);
+        // Slots are free again.
+        QVERIFY(Thread::put(new TestTask(&queued, QStringLiteral("again"))));
+        QTRY_COMPARE(int(queued.destroyed), Thread::BufferSize + 1);
+    }
 
-void ThreadTest::observerReportsRefusedTask()
-{
-    TaskObserver *observer = TaskObserver::instance();
-    fillRing();
-    QTest::ignoreMessage(QtWarningMsg, QRegularExpression(QStringLiteral("\"overflow\" refused")));
-    TestTask::Counters refused;
-    observer->performTask(new TestTask(&refused, QStringLiteral("overflow")));
-    // Not run, not leaked, and shown as failed rather than running for ever;
-    // the failure opens the list for the user to read.
-    QCOMPARE(int(refused.runs), 0);
-    QCOMPARE(int(refused.destroyed), 1);
-    QCOMPARE(observer->model()->index(0, 1).data(Qt::EditRole).toInt(), int(TaskDescription::Fail));
-    QCOMPARE(observer->runningCount(), 0);
-    QVERIFY(observer->dialog()->isVisible());
-    gate.release();
-    QTRY_COMPARE(int(queued.destroyed), Thread::BufferSize);
-}
+    void destroyingOneStopsAll()
+    {
+        QList<Thread *> workers{new Thread, new Thread, new Thread};
+        for (int i = 0; i < 3; ++i) {
+            workers[i]->start();
+            QTRY_COMPARE(workers[i]->threadIndex(), i);
+        }
+        delete workers.takeAt(1);
+        for (Thread *w : workers)
+            QVERIFY(w->wait(5000));
+        qDeleteAll(workers);
+    }
+
+    void queuedTasksDeletedAtStop()
+    {
+        fillRing();
+        // The destructor waits for the worker, which waits for the gate: open it
+        // from elsewhere once the stop has been requested.
+        std::thread opener([this] {
+            std::this_thread::sleep_for(std::chrono::milliseconds(100));
+            gate.release();
+        });
+        worker.reset();
+        opener.join();
+        // The full ring is emptied: no waiting task ran, all were deleted. The
+        // running task finished and reports as usual.
+        QCOMPARE(int(queued.runs), 0);
+        QCOMPARE(int(queued.destroyed), Thread::BufferSize);
+        QTRY_COMPARE(int(running.destroyed), 1);
+        QCOMPARE(int(running.afterRuns), 1);
+    }
+
+    void observerReportsRefusedTask()
+    {
+        TaskObserver *observer = TaskObserver::instance();
+        fillRing();
+        QTest::ignoreMessage(QtWarningMsg, QRegularExpression(QStringLiteral("\"overflow\" refused")));
+        TestTask::Counters refused;
+        observer->performTask(new TestTask(&refused, QStringLiteral("overflow")));
+        // Not run, not leaked, and shown as failed rather than running for ever;
+        // the failure opens the list for the user to read.
+        QCOMPARE(int(refused.runs), 0);
+        QCOMPARE(int(refused.destroyed), 1);
+        QCOMPARE(observer->model()->index(0, 1).data(Qt::EditRole).toInt(), int(TaskDescription::Fail));
+        QCOMPARE(observer->runningCount(), 0);
+        QVERIFY(observer->dialog()->isVisible());
+        gate.release();
+        QTRY_COMPARE(int(queued.destroyed), Thread::BufferSize);
+    }
+};
 
 QTEST_MAIN(ThreadTest)
 #include "tst_thread.moc"
