@@ -4,80 +4,55 @@
 
 #include <QAbstractItemModel>
 
-SignalLog::SignalLog(QObject *parent)
-    : QObject(parent)
-{
-}
-
-QStringList SignalLog::take()
-{
-    QStringList result;
-    result.swap(entries);
-    return result;
-}
-
 QString SignalLog::describe(const QModelIndex &index, bool withColumn) const
 {
     if (!index.isValid())
         return QStringLiteral("root");
-    QString text = index.sibling(index.row(), 0).data().toString();
-    if (withColumn)
-        text += QStringLiteral(":%1").arg(index.column());
-    return text;
+    const QString text = index.sibling(index.row(), 0).data().toString();
+    return withColumn ? text + QStringLiteral(":%1").arg(index.column()) : text;
+}
+
+void SignalLog::add(const char *what, const QString &who, int first, int last)
+{
+    entries << QStringLiteral("%1(%2, %3, %4)").arg(QLatin1String(what), who).arg(first).arg(last);
 }
 
 void SignalLog::watchModel(QAbstractItemModel *model)
 {
-    auto range = [this](const char *what, const QModelIndex &parent, int first, int last) {
-        entries.append(QStringLiteral("%1(%2, %3, %4)")
-                           .arg(QLatin1String(what), describe(parent))
-                           .arg(first)
-                           .arg(last));
+    auto range = [=](auto signal, const char *what) {
+        connect(model, signal, this, [=](const QModelIndex &p, int f, int l) { add(what, describe(p), f, l); });
     };
-    connect(model, &QAbstractItemModel::rowsAboutToBeInserted, this,
-            [range](const QModelIndex &p, int f, int l) { range("aboutToInsert", p, f, l); });
-    connect(model, &QAbstractItemModel::rowsInserted, this,
-            [range](const QModelIndex &p, int f, int l) { range("inserted", p, f, l); });
-    connect(model, &QAbstractItemModel::rowsAboutToBeRemoved, this,
-            [range](const QModelIndex &p, int f, int l) { range("aboutToRemove", p, f, l); });
-    connect(model, &QAbstractItemModel::rowsRemoved, this,
-            [range](const QModelIndex &p, int f, int l) { range("removed", p, f, l); });
-    connect(model, &QAbstractItemModel::dataChanged, this,
-            [this](const QModelIndex &tl, const QModelIndex &br) {
-                entries.append(QStringLiteral("changed(%1, %2)")
-                                   .arg(describe(tl, true), describe(br, true)));
-            });
-    connect(model, &QAbstractItemModel::modelAboutToBeReset, this,
-            [this] { entries.append(QStringLiteral("aboutToReset")); });
-    connect(model, &QAbstractItemModel::modelReset, this,
-            [this] { entries.append(QStringLiteral("reset")); });
-    connect(model, &QAbstractItemModel::layoutChanged, this,
-            [this] { entries.append(QStringLiteral("layoutChanged")); });
+    auto plain = [=](auto signal, const char *what) {
+        connect(model, signal, this, [=] { entries << QLatin1String(what); });
+    };
+    range(&QAbstractItemModel::rowsAboutToBeInserted, "aboutToInsert");
+    range(&QAbstractItemModel::rowsInserted, "inserted");
+    range(&QAbstractItemModel::rowsAboutToBeRemoved, "aboutToRemove");
+    range(&QAbstractItemModel::rowsRemoved, "removed");
+    connect(model, &QAbstractItemModel::dataChanged, this, [this](const QModelIndex &tl, const QModelIndex &br) {
+        entries << QStringLiteral("changed(%1, %2)").arg(describe(tl, true), describe(br, true));
+    });
+    plain(&QAbstractItemModel::modelAboutToBeReset, "aboutToReset");
+    plain(&QAbstractItemModel::modelReset, "reset");
+    plain(&QAbstractItemModel::layoutChanged, "layoutChanged");
 }
 
 void SignalLog::watchNode(TreeNode *node)
 {
     auto id = [](TreeNode *n) { return n ? n->id() : QStringLiteral("null"); };
-    auto range = [this, id](const char *what, TreeNode *p, int f, int l) {
-        entries.append(QStringLiteral("%1(%2, %3, %4)").arg(QLatin1String(what), id(p)).arg(f).arg(l));
+    auto range = [=](auto signal, const char *what) {
+        connect(node, signal, this, [=](TreeNode *p, int f, int l) { add(what, id(p), f, l); });
     };
-    auto single = [this, id](const char *what, TreeNode *n) {
-        entries.append(QStringLiteral("%1(%2)").arg(QLatin1String(what), id(n)));
+    auto single = [=](auto signal, const char *what) {
+        connect(node, signal, this,
+                [=](TreeNode *n) { entries << QStringLiteral("%1(%2)").arg(QLatin1String(what), id(n)); });
     };
-    connect(node, &TreeNode::nodesAboutToBeInserted, this,
-            [range](TreeNode *p, int f, int l) { range("nodesAboutToBeInserted", p, f, l); });
-    connect(node, &TreeNode::nodesAboutToBeRemoved, this,
-            [range](TreeNode *p, int f, int l) { range("nodesAboutToBeRemoved", p, f, l); });
-    connect(node, &TreeNode::nodesInserted, this,
-            [this] { entries.append(QStringLiteral("nodesInserted")); });
-    connect(node, &TreeNode::nodesRemoved, this,
-            [this] { entries.append(QStringLiteral("nodesRemoved")); });
-    connect(node, &TreeNode::nodeDataChanged, this,
-            [single](TreeNode *n) { single("nodeDataChanged", n); });
-    connect(node, &TreeNode::nodeChildsDataChanged, this,
-            [single](TreeNode *n) { single("nodeChildsDataChanged", n); });
-    connect(node, &TreeNode::setCurrentNode, this,
-            [single](TreeNode *n) { single("setCurrentNode", n); });
-    connect(node, &TreeNode::expandCurrentNode, this,
-            [single](TreeNode *n) { single("expandCurrentNode", n); });
+    range(&TreeNode::nodesAboutToBeInserted, "nodesAboutToBeInserted");
+    range(&TreeNode::nodesAboutToBeRemoved, "nodesAboutToBeRemoved");
+    connect(node, &TreeNode::nodesInserted, this, [this] { entries << QStringLiteral("nodesInserted"); });
+    connect(node, &TreeNode::nodesRemoved, this, [this] { entries << QStringLiteral("nodesRemoved"); });
+    single(&TreeNode::nodeDataChanged, "nodeDataChanged");
+    single(&TreeNode::nodeChildsDataChanged, "nodeChildsDataChanged");
+    single(&TreeNode::setCurrentNode, "setCurrentNode");
+    single(&TreeNode::expandCurrentNode, "expandCurrentNode");
 }

@@ -5,6 +5,8 @@
 #include <QObject>
 #include <QStringList>
 
+#include <utility>
+
 class QAbstractItemModel;
 class TreeNode;
 
@@ -28,16 +30,17 @@ class SignalLog : public QObject
     Q_OBJECT
 
 public:
-    explicit SignalLog(QObject *parent = nullptr);
+    using QObject::QObject;
 
     void watchModel(QAbstractItemModel *model);
     void watchNode(TreeNode *node);
 
     QStringList entries;
-    QStringList take();
+    QStringList take() { return std::exchange(entries, QStringList()); }
 
 private:
     QString describe(const QModelIndex &index, bool withColumn = false) const;
+    void add(const char *what, const QString &who, int first, int last);
 };
 
 #endif

@@ -8,30 +8,26 @@
 /*!
  * A node for tests: shows its id in column 0 and "<id>:<column>" in the other
  * columns, accepts edits of column 0 (the edit becomes its display text), and
- * lets a test choose its column count, special flags and lazy loading.
+ * lets a test choose its column count and special flags, record afterLoad()
+ * calls and count destructions.
  */
 class TestTreeNode : public TreeNode
 {
     Q_OBJECT
 
 public:
-    explicit TestTreeNode(const QString &id, QObject *parent = nullptr);
-    TestTreeNode(const QString &id, int expectedDepth, const QString &expectedParentId,
-                 QObject *parent = nullptr);
-    ~TestTreeNode() override;
+    explicit TestTreeNode(const QString &id, QObject *parent = nullptr, int expectedDepth = -1,
+                          const QString &expectedParentId = QString());
+    ~TestTreeNode() override { if (destructionCount) ++*destructionCount; }
 
     int columnCount() const override { return columns; }
-    QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
     QVariant data(int column, int role) const override;
     bool setData(int column, const QVariant &value, int role) override;
     int treeNodeSpecialFlags() const override { return specialFlags; }
-    bool canFetchMore() const override { return fetchable; }
-    void fetchMore() override;
-    void afterLoad() override;
+    void afterLoad() override { if (afterLoadLog) afterLoadLog->append(id()); }
 
     int columns = 2;
     int specialFlags = 0;
-    bool fetchable = false;
     QString text;
     QStringList *afterLoadLog = nullptr; // appended with the id on afterLoad()
     int *destructionCount = nullptr;     // incremented by the destructor
