@@ -1,6 +1,6 @@
 #include "filtertreenodesortfilterproxymodel.h"
 
-#include <QRegExp>
+#include "treenodeproxyhelper_p.h"
 
 FilterTreeNodeSortFilterProxyModel::FilterTreeNodeSortFilterProxyModel(int specialFlagsFilter,
                                                                        QObject *parent)
@@ -20,27 +20,6 @@ FilterTreeNodeSortFilterProxyModel::~FilterTreeNodeSortFilterProxyModel() = defa
 bool FilterTreeNodeSortFilterProxyModel::filterAcceptsRow(int sourceRow,
                                                           const QModelIndex &sourceParent) const
 {
-    if (!TreeNodeSortFilterProxyModel::filterAcceptsRow(sourceRow, sourceParent))
-        return false;
-    const QRegExp regExp = filterRegExp();
-    if (regExp.isEmpty() || !regExp.isValid())
-        return true;
-    const QAbstractItemModel *source = sourceModel();
-    if (!source)
-        return true;
-
-    QList<int> columns = _acceptColumns.values();
-    if (columns.isEmpty()) {
-        const int count = source->columnCount(sourceParent);
-        for (int column = 0; column < count; ++column)
-            columns.append(column);
-    }
-    for (int column : qAsConst(columns)) {
-        const QModelIndex index = source->index(sourceRow, column, sourceParent);
-        if (!index.isValid())
-            continue;
-        if (index.data(Qt::DisplayRole).toString().indexOf(regExp) != -1)
-            return true;
-    }
-    return false;
+    return TreeNodeSortFilterProxyModel::filterAcceptsRow(sourceRow, sourceParent)
+           && TreeNodeProxyHelper::textFilterAccepts(this, sourceRow, sourceParent, _acceptColumns);
 }

@@ -1,5 +1,10 @@
 #include "treenodeproxyhelper_p.h"
 
+#include <QRegExp>
+#include <QSortFilterProxyModel>
+
+#include <algorithm>
+
 #include "treenodemodelextension.h"
 
 #include <QAbstractProxyModel>
@@ -79,6 +84,29 @@ QModelIndex treeNodeToIndex(const QAbstractProxyModel *proxy, TreeNode *node)
             return other;
     }
     return QModelIndex();
+}
+
+bool textFilterAccepts(const QSortFilterProxyModel *proxy, int sourceRow, const QModelIndex &sourceParent,
+                       const QSet<int> &columns, int firstColumn)
+{
+    const QRegExp regExp = proxy->filterRegExp();
+    if (regExp.isEmpty() || !regExp.isValid())
+        return true;
+    const QAbstractItemModel *source = proxy->sourceModel();
+    if (!source)
+        return true;
+    auto matches = [&](int column) {
+        const QModelIndex index = source->index(sourceRow, column, sourceParent);
+        return index.isValid() && index.data(Qt::DisplayRole).toString().indexOf(regExp) != -1;
+    };
+    if (!columns.isEmpty())
+        return std::any_of(columns.begin(), columns.end(), matches);
+    const int count = source->columnCount(sourceParent);
+    for (int column = firstColumn; column < count; ++column) {
+        if (matches(column))
+            return true;
+    }
+    return false;
 }
 
 } // namespace TreeNodeProxyHelper

@@ -3,9 +3,11 @@
 
 #include <QItemSelection>
 #include <QModelIndex>
+#include <QSet>
 
 class QAbstractItemModel;
 class QAbstractProxyModel;
+class QSortFilterProxyModel;
 class TreeNode;
 class TreeNodeModelExtension;
 
@@ -25,6 +27,13 @@ TreeNode *toTreeNode(const QAbstractProxyModel *proxy, const QModelIndex &index)
 TreeNode *toTreeNode(const QAbstractProxyModel *proxy, const QItemSelectionRange &range);
 TreeNode *toTreeNode(const QAbstractProxyModel *proxy, const QItemSelection &selection);
 QModelIndex treeNodeToIndex(const QAbstractProxyModel *proxy, TreeNode *node);
+
+// The text filter of the filtering proxies: whether the display text of one
+// of \a columns of the source row matches the proxy's expression (every
+// column from \a firstColumn on when \a columns is empty). An empty or
+// invalid expression, or no source, accepts the row.
+bool textFilterAccepts(const QSortFilterProxyModel *proxy, int sourceRow, const QModelIndex &sourceParent,
+                       const QSet<int> &columns, int firstColumn = 0);
 
 } // namespace TreeNodeProxyHelper
 

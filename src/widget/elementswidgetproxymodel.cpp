@@ -1,6 +1,6 @@
 #include "elementswidgetproxymodel.h"
 
-#include <QRegExp>
+#include "treenodeproxyhelper_p.h"
 
 ElementsWidgetProxyModel::ElementsWidgetProxyModel(int specialFlagsFilter, QObject *parent)
     : ListWidgetProxyModel(specialFlagsFilter, parent)
@@ -18,21 +18,9 @@ bool ElementsWidgetProxyModel::filterAcceptsColumn(int sourceColumn, const QMode
 
 bool ElementsWidgetProxyModel::filterAcceptsRow(int sourceRow, const QModelIndex &sourceParent) const
 {
-    if (sourceParent.isValid())
-        return false;
-    if (!TreeNodeSortFilterProxyModel::filterAcceptsRow(sourceRow, sourceParent))
-        return false;
-    const QRegExp regExp = filterRegExp();
-    if (regExp.isEmpty() || !regExp.isValid())
-        return true;
-    const QAbstractItemModel *source = sourceModel();
-    if (!source)
-        return true;
-    const int count = source->columnCount(sourceParent);
-    for (int column = 1; column < count; ++column) {
-        const QModelIndex index = source->index(sourceRow, column, sourceParent);
-        if (index.data(Qt::DisplayRole).toString().indexOf(regExp) != -1)
-            return true;
-    }
-    return false;
+    // Only the first level, and column 0 is never searched: a source with a
+    // single column keeps no row once a filter is set.
+    return !sourceParent.isValid()
+           && TreeNodeSortFilterProxyModel::filterAcceptsRow(sourceRow, sourceParent)
+           && TreeNodeProxyHelper::textFilterAccepts(this, sourceRow, sourceParent, QSet<int>(), 1);
 }
