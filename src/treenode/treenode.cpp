@@ -1,11 +1,11 @@
 #include "treenode.h"
 
-#include <QMetaMethod>
+#include <QMetaObject>
 #include <QSet>
-#include <QVector>
 #include <QtAlgorithms>
 
 #include <algorithm>
+#include <array>
 #include <cstdlib>
 #include <vector>
 
@@ -145,13 +145,20 @@ TreeNode::~TreeNode()
 
 void TreeNode::insert(int position, const QList<TreeNode *> &nodes)
 {
+    // Nulls, this node itself and repeated pointers are dropped. A single
+    // node, the usual case, needs no set of the ones seen.
     QList<TreeNode *> incoming;
-    incoming.reserve(nodes.size());
-    QSet<TreeNode *> seen;
-    for (TreeNode *node : nodes) {
-        if (node && node != this && !seen.contains(node)) {
-            seen.insert(node);
-            incoming.append(node);
+    if (nodes.size() == 1) {
+        if (nodes.first() && nodes.first() != this)
+            incoming = nodes;
+    } else {
+        incoming.reserve(nodes.size());
+        QSet<TreeNode *> seen;
+        for (TreeNode *node : nodes) {
+            if (node && node != this && !seen.contains(node)) {
+                seen.insert(node);
+                incoming.append(node);
+            }
         }
     }
     if (incoming.isEmpty())
@@ -344,22 +351,41 @@ void TreeNode::loadTreeFromList(const QList<TreeNode *> &nodes)
 {
     clear();
 
-    // Sorted through a compact array of keys: the comparisons then touch
-    // neither the nodes nor copies of their ids.
+    // Sorted through a compact array of keys. The first four UTF-16 units of
+    // each id are packed into an integer that orders like the string, so
+    // most comparisons touch neither the nodes nor their string data: in a
+    // list of many thousand nodes each such visit is a cache miss.
     struct Key
     {
         int depth;
+        int length;
+        quint64 prefix;
         const QString *id;
         TreeNode *node;
     };
+    constexpr int prefixLength = 4;
     std::vector<Key> keys;
     keys.reserve(std::size_t(nodes.size()));
     for (TreeNode *node : nodes) {
-        if (node)
-            keys.push_back(Key{node->_expectedDepth, &node->_id, node});
+        if (!node)
+            continue;
+        const QString &id = node->_id;
+        quint64 prefix = 0;
+        for (int i = 0; i < prefixLength; ++i)
+            prefix = (prefix << 16) | (i < id.size() ? id.at(i).unicode() : 0u);
+        keys.push_back(Key{node->_expectedDepth, id.size(), prefix, &id, node});
     }
     std::sort(keys.begin(), keys.end(), [](const Key &a, const Key &b) {
-        return a.depth != b.depth ? a.depth < b.depth : *a.id < *b.id;
+        if (a.depth != b.depth)
+            return a.depth < b.depth;
+        if (a.prefix != b.prefix)
+            return a.prefix < b.prefix;
+        // Equal prefixes: ids of up to four units are then told apart by
+        // their length alone (a shorter id is a prefix of the longer one,
+        // which the zero padding cannot distinguish from a real U+0000).
+        if (a.length <= prefixLength && b.length <= prefixLength)
+            return a.length < b.length;
+        return *a.id < *b.id;
     });
     QList<TreeNode *> list;
     list.reserve(int(keys.size()) + 1);
@@ -404,13 +430,15 @@ void TreeNode::loadTreeFromList(const QList<TreeNode *> &nodes)
 
 namespace {
 
-// The eight notification signals, looked up once. Connecting by meta-method
-// makes exactly the connections that the SIGNAL() form makes (they can be
-// broken with either form), without parsing eight signatures on every
-// insertion: a tree of many thousand nodes is hung node by node.
-const QVector<QMetaMethod> &notificationSignals()
+// Method indexes of the eight notification signals, looked up once. Each
+// child signal is connected to the parent's signal of the same index, which
+// is exactly the connection that the SIGNAL() form makes (either form can
+// break it). Going by index skips the signature parsing and argument checks
+// of the string and QMetaMethod forms: a tree of many thousand nodes makes
+// eight connections per node, and those checks were most of their cost.
+const std::array<int, 8> &notificationSignals()
 {
-    static const QVector<QMetaMethod> methods = [] {
+    static const std::array<int, 8> indexes = [] {
         const char *const signatures[] = {
             "nodesAboutToBeInserted(TreeNode*,int,int)",
             "nodesAboutToBeRemoved(TreeNode*,int,int)",
@@ -421,13 +449,15 @@ const QVector<QMetaMethod> &notificationSignals()
             "setCurrentNode(TreeNode*)",
             "expandCurrentNode(TreeNode*)",
         };
-        QVector<QMetaMethod> result;
+        std::array<int, 8> result{};
         const QMetaObject &meta = TreeNode::staticMetaObject;
-        for (const char *signature : signatures)
-            result.append(meta.method(meta.indexOfSignal(signature)));
+        for (std::size_t i = 0; i < result.size(); ++i) {
+            result[i] = meta.indexOfSignal(signatures[i]);
+            Q_ASSERT(result[i] >= 0);
+        }
         return result;
     }();
-    return methods;
+    return indexes;
 }
 
 } // namespace
@@ -436,16 +466,16 @@ void TreeNode::connectChildSignals(TreeNode *child)
 {
     if (!child)
         return;
-    for (const QMetaMethod &signal : notificationSignals())
-        connect(child, signal, this, signal);
+    for (const int signal : notificationSignals())
+        QMetaObject::connect(child, signal, this, signal, Qt::AutoConnection);
 }
 
 void TreeNode::disconnectChildSignals(TreeNode *child)
 {
     if (!child)
         return;
-    for (const QMetaMethod &signal : notificationSignals())
-        disconnect(child, signal, this, signal);
+    for (const int signal : notificationSignals())
+        QMetaObject::disconnect(child, signal, this, signal);
 }
 
 int TreeNode::row() const

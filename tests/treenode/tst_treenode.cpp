@@ -214,6 +214,33 @@ private Q_SLOTS:
         QCOMPARE(log.entries.first(), QStringLiteral("nodesAboutToBeRemoved(, 0, 0)"));
     }
 
+    // Siblings come out in the order of QString's own comparison, also for
+    // ids that share long prefixes, are prefixes of each other, hold U+0000
+    // or code units above 0x7fff.
+    void loadTreeFromListOrdersLikeStrings()
+    {
+        const QChar nul(0);
+        QStringList ids{QStringLiteral("abcd"), QStringLiteral("abcde"), QStringLiteral("abc"),
+                        QStringLiteral("abcd") + nul, QStringLiteral("abc") + nul, QStringLiteral("abc") + nul + nul,
+                        QStringLiteral("ab") + QChar(0xffff) + QStringLiteral("z"), QStringLiteral("ab") + QChar(0xe9),
+                        QStringLiteral("ab") + QChar(0x8000), QStringLiteral("ab") + QChar(0x7fff),
+                        QStringLiteral("abcc") + QChar(0xffff), QStringLiteral("abcdefgh1"), QStringLiteral("abcdefgh0"),
+                        QString(), QStringLiteral("Z"), QStringLiteral("a"), QString(nul)};
+        std::reverse(ids.begin(), ids.end());
+        TestTreeNode root(QString(), nullptr, 0);
+        QList<TreeNode *> list;
+        for (const QString &id : qAsConst(ids))
+            list << new TestTreeNode(id, &root, 1);
+        root.loadTreeFromList(list);
+
+        QStringList sorted = ids;
+        std::sort(sorted.begin(), sorted.end());
+        QStringList loaded;
+        for (TreeNode *node : root.childNodes())
+            loaded << node->id();
+        QCOMPARE(loaded, sorted);
+    }
+
     // Any node answers its expected parent id in every column; a configuration
     // entry shows its name and value under fixed headers, one level below its root.
     void rolesAndConfNodes()
