@@ -4,6 +4,18 @@
 #include "elementtreeops_p.h"
 #include "module.h"
 
+#include <QSet>
+
+namespace {
+
+// Elements whose destructor is running. The classes derived from Element are
+// already gone then, so what only they supply (the tool tip) cannot be asked
+// for: a listener of the removal that ~Element announces gets nothing
+// instead of a call to a pure virtual function.
+thread_local QSet<const Element *> dyingElements;
+
+} // namespace
+
 Element::Element(Module &module, RightsPredicate rights)
     : TreeNode(nullptr)
     , ContextOperation(ElementContextType, module, rights)
@@ -19,7 +31,9 @@ Element::~Element()
     // Leaving the tree while the element is still an Element: the removal
     // notifications reach the module with a usable context, and they may
     // still read the element's data.
+    dyingElements.insert(this);
     reset();
+    dyingElements.remove(this);
     delete _elementData;
     _elementData = nullptr;
 }
@@ -60,6 +74,8 @@ QVariant Element::data(int column, int role) const
         case Qt::DecorationRole:
             return defaultIcon();
         case Qt::ToolTipRole:
+            if (!dyingElements.isEmpty() && dyingElements.contains(this))
+                return QVariant();
             return toolTipText();
         default:
             break;

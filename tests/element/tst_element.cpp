@@ -158,8 +158,17 @@ private Q_SLOTS:
         root.append(group);
         group->append(alice);
         module->log.clear();
+        // A listener reading the leaving row meets an element whose own class
+        // is already gone: it still has its title, but no tool tip to give.
+        QStringList heard;
+        QObject::connect(&root, &TreeNode::nodesAboutToBeRemoved, [&heard](TreeNode *parent, int first) {
+            const TreeNode *leaving = parent->childNodes().at(first);
+            heard << leaving->data(0, Qt::DisplayRole).toString() << leaving->data(0, Qt::ToolTipRole).toString();
+        });
+        QCOMPARE(group->data(0, Qt::ToolTipRole).toString(), QStringLiteral("tip:staff"));
         delete group;
         QCOMPARE(module->log, (QStringList{"Removed(group_staff)", "Removed(user_alice)"}));
+        QCOMPARE(heard, (QStringList{"staff", QString()}));
 
         // Elements owned by their module outlive its destructor while they
         // are still in an element tree: their removal must not call into it.
