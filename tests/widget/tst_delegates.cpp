@@ -40,7 +40,6 @@ class DelegatesTest : public QObject
     Q_OBJECT
 
     std::unique_ptr<MiscDelegateTableView> view;
-    std::unique_ptr<QAbstractItemModelTester> tester;
     std::unique_ptr<QStandardItemModel> model;
     QStringList writes; // "row,column=value" for each change of the model
 
@@ -49,14 +48,13 @@ private Q_SLOTS:
     {
         // A shown table of rows of text, a choice (item index) and a number.
         view.reset();
-        tester.reset();
         model.reset(new QStandardItemModel(3, 3));
         for (int row = 0; row < 3; ++row) {
             model->setData(model->index(row, TextColumn), QStringLiteral("x%1").arg(row));
             model->setData(model->index(row, ChoiceColumn), 1);
             model->setData(model->index(row, NumberColumn), 97);
         }
-        tester.reset(new QAbstractItemModelTester(model.get(), QAbstractItemModelTester::FailureReportingMode::QtTest));
+        new QAbstractItemModelTester(model.get(), QAbstractItemModelTester::FailureReportingMode::QtTest, model.get());
         writes.clear();
         connect(model.get(), &QAbstractItemModel::dataChanged, this, [this](const QModelIndex &from) {
             writes.append(QStringLiteral("%1,%2=%3").arg(from.row()).arg(from.column()).arg(from.data().toString()));

@@ -79,9 +79,8 @@ private Q_SLOTS:
         QTest::addColumn<QString>("chosen");
         QTest::addColumn<QString>("written");
 
-        QTest::newRow("without extension") << "plain" << "plain.html";
         QTest::newRow("with extension") << "page.html" << "page.html";
-        // The extension is compared case-sensitively.
+        // The extension is compared case-sensitively: any other ending gets one.
         QTest::newRow("upper-case extension") << "PAGE.HTML" << "PAGE.HTML.html";
         QTest::newRow("cancelled") << "" << "";
     }
