@@ -44,8 +44,6 @@ public:
     ~FakePrograms() { qputenv("PATH", _savedPath); }
 
     QString filePath(const QString &name) const { return _dir.filePath(name); }
-    // Leaves the fake folder alone on PATH, so that every other program is missing.
-    void useOnlyFakes() { qputenv("PATH", QFile::encodeName(_dir.path())); }
     // An executable script `name` running \a body under /bin/sh; returns its path.
     QString add(const QString &name, const QByteArray &body)
     {

@@ -61,11 +61,9 @@ private Q_SLOTS:
         // More than any pipe buffer holds, on both channels: the wait must keep reading.
         QTest::newRow("large output") << sh << c("head -c 300000 /dev/zero | tr '\\000' a; head -c 300000 /dev/zero >&2")
                                       << true << "output:" + QString(300000, QLatin1Char('a'));
-        QTest::newRow("stderr appended, newline kept")
-            << sh << c("echo boom >&2; exit 2") << true << exited("echo boom >&2; exit 2", 2) + ". boom\n";
         QTest::newRow("no stderr, no separator, percent signs kept") << sh << QStringList{"-c", "exit 3", "%2", "%1"} << true
             << "Process '/bin/sh -c exit 3 %2 %1' execute with error code '3'";
-        QTest::newRow("stderr untrimmed, cut at NUL")
+        QTest::newRow("stderr appended untrimmed, cut at NUL")
             << sh << c("printf '  two\\nlines \\n\\000cd' >&2; exit 4") << true
             << exited("printf '  two\\nlines \\n\\000cd' >&2; exit 4", 4) + ".   two\nlines \n";
         QTest::newRow("time-out, unchecked exit code") << "hang" << QStringList() << false << "Process 'hang' not finished";
@@ -101,14 +99,13 @@ private Q_SLOTS:
         QTest::addColumn<bool>("installed");
         QTest::addColumn<QString>("message");
 
-        const QString failed = QStringLiteral("Process 'dpkg-query -W -f=${Status}\n some-package' not finished");
-        QTest::newRow("unpacked counts") << QByteArray("echo 'install ok unpacked'") << true << QString();
-        QTest::newRow("config files only") << QByteArray("echo 'deinstall ok config-files'") << false << QString();
-        QTest::newRow("match on a later line, no final newline")
-            << QByteArray("printf 'purge ok not-installed\\n\\ninstall ok installed'") << true << QString();
-        QTest::newRow("non-zero exit is not an error")
-            << QByteArray("echo 'dpkg-query: no packages found' >&2; exit 1") << false << QString();
-        QTest::newRow("dpkg-query crashes") << QByteArray("echo 'install ok installed'; kill -ABRT $$") << false << failed;
+        // Any state after "install ok" counts.
+        QTest::newRow("unpacked, on a later line, no final newline")
+            << QByteArray("printf 'purge ok not-installed\\n\\ninstall ok unpacked'") << true << QString();
+        QTest::newRow("config files only, non-zero exit is not an error")
+            << QByteArray("echo 'deinstall ok config-files'; exit 1") << false << QString();
+        QTest::newRow("dpkg-query crashes") << QByteArray("echo 'install ok installed'; kill -ABRT $$") << false
+                                            << "Process 'dpkg-query -W -f=${Status}\n some-package' not finished";
     }
 
     void packageInstalled()

@@ -1,9 +1,8 @@
 #include <kvt-common/blockdialog.h>
-#include <kvt-common/taskobserver.h>
 #include <kvt-common/taskobserverdialog.h>
 #include <kvt-common/taskobservermodel.h>
-#include <kvt-common/thread.h>
 
+#include "taskprobe.h"
 #include "testtask.h"
 
 #include <QAbstractItemModelTester>
@@ -24,19 +23,9 @@ class TaskObserverTest : public QObject
 {
     Q_OBJECT
 
-private Q_SLOTS:
-    void initTestCase();
-    void cleanupTestCase();
-    void cleanup();
-    void dialogFollowsTasks_data();
-    void dialogFollowsTasks();
-    void dialogButtons_data();
-    void dialogButtons();
-
-private:
     TaskObserver *observer = nullptr;
     TaskObserverModel *model = nullptr;
-    QList<Thread *> workers;
+    Workers workers;
     std::unique_ptr<QAbstractItemModelTester> tester;
     TestTask::Counters counters;
     QSemaphore gate; // opened at cleanup
@@ -53,161 +42,155 @@ private:
     }
     int status(int row) const { return model->index(row, 1).data(Qt::EditRole).toInt(); }
     bool requestStop(int row) { return model->setData(model->index(row, 1), 4, Qt::EditRole); }
-};
 
-void TaskObserverTest::initTestCase()
-{
-    observer = TaskObserver::instance();
-    model = observer->model();
-    tester.reset(new QAbstractItemModelTester(model, QAbstractItemModelTester::FailureReportingMode::QtTest));
-    for (int i = 0; i < 2; ++i) {
-        workers.append(new Thread);
-        workers.last()->start();
-        QTRY_VERIFY(workers.last()->threadIndex() >= 0);
+private Q_SLOTS:
+    void initTestCase()
+    {
+        observer = TaskObserver::instance();
+        model = observer->model();
+        tester.reset(new QAbstractItemModelTester(model, QAbstractItemModelTester::FailureReportingMode::QtTest));
+        workers.start(2);
+        QTest::qWait(20); // a running worker opens the ring a moment after it takes its index
     }
-    QTest::qWait(20); // a running worker opens the ring a moment after it takes its index
-}
-
-void TaskObserverTest::cleanupTestCase()
-{
-    qDeleteAll(workers);
-    delete observer;
-}
-
-void TaskObserverTest::cleanup()
-{
-    gate.release(10);
-    QTRY_COMPARE(observer->runningCount(), 0);
-    QTRY_COMPARE(int(counters.destroyed), int(counters.runs));
-    gate.acquire(gate.available());
-    if (dialog()->isVisible())
-        buttonBox()->button(QDialogButtonBox::Close)->click();
-    QCOMPARE(model->rowCount(), 0);
-    QTRY_VERIFY(!blockDialogShown());
-}
-
-void TaskObserverTest::dialogFollowsTasks_data()
-{
-    QTest::addColumn<bool>("slow");
-    QTest::addColumn<Status>("outcome");
-    QTest::newRow("quick success leaves no trace") << false << TaskDescription::Success;
-    QTest::newRow("quick failure") << false << TaskDescription::Fail;
-    QTest::newRow("slow success") << true << TaskDescription::Success;
-    QTest::newRow("slow warning") << true << TaskDescription::Warning;
-}
-
-void TaskObserverTest::dialogFollowsTasks()
-{
-    QFETCH(bool, slow);
-    QFETCH(Status, outcome);
-
-    auto *task = new TestTask(&counters, QStringLiteral("job"), outcome, slow ? &gate : nullptr);
-    observer->performTask(task);
-    observer->performTask(task); // listed and run once however often it is given
-    observer->performTask(nullptr);
-    QCOMPARE(model->rowCount(), 1);
-    // Work has started: the window is blocked and closing is not possible.
-    QVERIFY(blockDialogShown());
-    QVERIFY(!buttonBox()->isEnabled());
-    QVERIFY(!dialog()->isVisible());
-    if (slow) {
-        // After a second the task dialog takes over, still not closable.
-        QTRY_VERIFY_WITH_TIMEOUT(dialog()->isVisible(), 3000);
+    void cleanupTestCase()
+    {
+        workers.stop();
+        delete observer;
+    }
+    // Closing the dialog empties the list of tasks and problems.
+    void cleanup()
+    {
+        gate.release(10);
+        QTRY_COMPARE(observer->runningCount(), 0);
+        QTRY_COMPARE(int(counters.destroyed), int(counters.runs));
+        gate.acquire(gate.available());
+        if (dialog()->isVisible())
+            buttonBox()->button(QDialogButtonBox::Close)->click();
+        QVERIFY(!dialog()->isVisible());
+        QCOMPARE(model->rowCount(), 0);
+        QCOMPARE(observer->problemCount(), 0);
         QTRY_VERIFY(!blockDialogShown());
-        QTest::keyClick(dialog(), Qt::Key_Escape);
-        QVERIFY(!dialog()->close());
-        QVERIFY(dialog()->isVisible());
-        gate.release();
     }
-    QTRY_COMPARE(observer->runningCount(), 0);
-    QVERIFY(buttonBox()->isEnabled());
-    QTRY_VERIFY(!blockDialogShown());
-    // A success closes the dialog and clears the list; a problem leaves both
-    // for the user to read, until the dialog is closed.
-    const bool problem = outcome != TaskDescription::Success;
-    QCOMPARE(dialog()->isVisible(), problem);
-    QCOMPARE(model->rowCount(), problem ? 1 : 0);
-    if (!problem)
-        return;
-    QCOMPARE(status(0), int(outcome));
-    if (slow) { // left with Escape on the message page, it reopens on the list
+
+    void dialogFollowsTasks_data()
+    {
+        QTest::addColumn<bool>("slow");
+        QTest::addColumn<Status>("outcome");
+        QTest::newRow("quick success leaves no trace") << false << TaskDescription::Success;
+        QTest::newRow("quick failure") << false << TaskDescription::Fail;
+        QTest::newRow("slow success") << true << TaskDescription::Success;
+        QTest::newRow("slow warning") << true << TaskDescription::Warning;
+    }
+
+    void dialogFollowsTasks()
+    {
+        QFETCH(bool, slow);
+        QFETCH(Status, outcome);
+
+        auto *task = new TestTask(&counters, QStringLiteral("job"), outcome, slow ? &gate : nullptr);
+        observer->performTask(task);
+        observer->performTask(task); // listed and run once however often it is given
+        observer->performTask(nullptr);
+        QCOMPARE(model->rowCount(), 1);
+        // Work has started: the window is blocked and closing is not possible.
+        QVERIFY(blockDialogShown());
+        QVERIFY(!buttonBox()->isEnabled());
+        QVERIFY(!dialog()->isVisible());
+        if (slow) {
+            // After a second the task dialog takes over, still not closable.
+            QTRY_VERIFY_WITH_TIMEOUT(dialog()->isVisible(), 3000);
+            QTRY_VERIFY(!blockDialogShown());
+            QTest::keyClick(dialog(), Qt::Key_Escape);
+            QVERIFY(!dialog()->close());
+            QVERIFY(dialog()->isVisible());
+            gate.release();
+        }
+        QTRY_COMPARE(observer->runningCount(), 0);
+        QVERIFY(buttonBox()->isEnabled());
+        QTRY_VERIFY(!blockDialogShown());
+        // A success closes the dialog and clears the list; a problem leaves both
+        // for the user to read, until the dialog is closed.
+        const bool problem = outcome != TaskDescription::Success;
+        QCOMPARE(dialog()->isVisible(), problem);
+        QCOMPARE(model->rowCount(), problem ? 1 : 0);
+        if (!problem)
+            return;
+        QCOMPARE(status(0), int(outcome));
+        if (!slow) // cleanup() closes it
+            return;
+        // Left with Escape on the message page, it reopens on the list.
         dialog()->doubleClick(model->index(0, 0));
         QTest::keyClick(dialog(), Qt::Key_Escape);
         QVERIFY(!dialog()->isVisible());
         dialog()->open();
         QCOMPARE(child<QStackedWidget>("_stackedWidget")->currentIndex(), 0);
         QVERIFY(child<QPlainTextEdit>("_errorPlainTextEdit")->toPlainText().isEmpty());
-        return;
     }
-    buttonBox()->button(QDialogButtonBox::Close)->click();
-    QVERIFY(!dialog()->isVisible());
-    QCOMPARE(model->rowCount(), 0);
-    QCOMPARE(observer->problemCount(), 0);
-}
 
-void TaskObserverTest::dialogButtons_data()
-{
-    // The row under test is "job"; a title means the row has a message to show.
-    QTest::addColumn<Status>("state");
-    QTest::addColumn<bool>("stoppable");
-    QTest::addColumn<bool>("stop");
-    QTest::addColumn<QString>("title");
-    QTest::newRow("running, stoppable") << TaskDescription::Processing << true << true << "";
-    QTest::newRow("running") << TaskDescription::Processing << false << false << "";
-    QTest::newRow("succeeded, stoppable") << TaskDescription::Success << true << false << "";
-    QTest::newRow("failed") << TaskDescription::Fail << false << false << "Error: job";
-    QTest::newRow("warned") << TaskDescription::Warning << false << false << "Warning: job";
-}
+    void dialogButtons_data()
+    {
+        // The row under test is "job"; a title means the row has a message to show.
+        QTest::addColumn<Status>("state");
+        QTest::addColumn<bool>("stoppable");
+        QTest::addColumn<bool>("stop");
+        QTest::addColumn<QString>("title");
+        QTest::newRow("running, stoppable") << TaskDescription::Processing << true << true << "";
+        QTest::newRow("running") << TaskDescription::Processing << false << false << "";
+        QTest::newRow("succeeded, stoppable") << TaskDescription::Success << true << false << "";
+        QTest::newRow("failed") << TaskDescription::Fail << false << false << "Error: job";
+        QTest::newRow("warned") << TaskDescription::Warning << false << false << "Warning: job";
+    }
 
-void TaskObserverTest::dialogButtons()
-{
-    QFETCH(Status, state);
-    QFETCH(bool, stoppable);
-    QFETCH(bool, stop);
-    QFETCH(QString, title);
-    const bool running = state == TaskDescription::Processing;
-    const bool more = !title.isEmpty();
+    void dialogButtons()
+    {
+        QFETCH(Status, state);
+        QFETCH(bool, stoppable);
+        QFETCH(bool, stop);
+        QFETCH(QString, title);
+        const bool running = state == TaskDescription::Processing;
+        const bool more = !title.isEmpty();
 
-    // Row 0 runs for the whole test, so that the row under test stays listed.
-    observer->performTask(new TestTask(&counters, QStringLiteral("keeper"), TaskDescription::Success, &gate, true));
-    observer->performTask(new TestTask(&counters, QStringLiteral("job"), running ? TaskDescription::Success : state,
-                                       running ? &gate : nullptr, stoppable));
-    QTRY_COMPARE(status(1), int(state));
-    dialog()->open();
-    auto *moreButton = child<QPushButton>("_morePushButton");
-    auto *stopButton = child<QPushButton>("_stopPushButton");
-    auto buttons = [&] { return qMakePair(moreButton->isEnabled(), stopButton->isEnabled()); };
-    QCOMPARE(buttons(), qMakePair(false, false)); // nothing selected yet
-    child<QTreeView>("_taskTreeView")->selectionModel()->select(
-        model->index(1, 0), QItemSelectionModel::ClearAndSelect | QItemSelectionModel::Rows);
-    QCOMPARE(buttons(), qMakePair(more, stop));
-    QVERIFY(requestStop(0)); // a change in a row that is not selected leaves them alone
-    QCOMPARE(buttons(), qMakePair(more, stop));
-    // Only the value 4 edited in column 1 asks a task to stop.
-    QVERIFY(!model->setData(model->index(1, 1), 1, Qt::EditRole));
-    QVERIFY(!model->setData(model->index(1, 0), 4, Qt::EditRole));
-    QVERIFY(!model->setData(model->index(1, 1), 4, Qt::DisplayRole));
-    QCOMPARE(status(1), int(state));
+        // Row 0 runs for the whole test, so that the row under test stays listed.
+        observer->performTask(new TestTask(&counters, QStringLiteral("keeper"), TaskDescription::Success, &gate, true));
+        observer->performTask(new TestTask(&counters, QStringLiteral("job"), running ? TaskDescription::Success : state,
+                                           running ? &gate : nullptr, stoppable));
+        QTRY_COMPARE(status(1), int(state));
+        dialog()->open();
+        auto *moreButton = child<QPushButton>("_morePushButton");
+        auto *stopButton = child<QPushButton>("_stopPushButton");
+        auto buttons = [&] { return qMakePair(moreButton->isEnabled(), stopButton->isEnabled()); };
+        QCOMPARE(buttons(), qMakePair(false, false)); // nothing selected yet
+        child<QTreeView>("_taskTreeView")->selectionModel()->select(
+            model->index(1, 0), QItemSelectionModel::ClearAndSelect | QItemSelectionModel::Rows);
+        QCOMPARE(buttons(), qMakePair(more, stop));
+        QVERIFY(requestStop(0)); // a change in a row that is not selected leaves them alone
+        QCOMPARE(buttons(), qMakePair(more, stop));
+        // Only the value 4 edited in column 1 asks a task to stop.
+        QVERIFY(!model->setData(model->index(1, 1), 1, Qt::EditRole));
+        QVERIFY(!model->setData(model->index(1, 0), 4, Qt::EditRole));
+        QVERIFY(!model->setData(model->index(1, 1), 4, Qt::DisplayRole));
+        QCOMPARE(status(1), int(state));
 
-    // Double-clicking a row with a problem shows its message.
-    dialog()->doubleClick(model->index(1, 0));
-    QCOMPARE(child<QStackedWidget>("_stackedWidget")->currentIndex(), more ? 1 : 0);
-    QCOMPARE(dialog()->windowTitle(), more ? title : "Tasks");
-    QCOMPARE(child<QPlainTextEdit>("_errorPlainTextEdit")->toPlainText(), more ? "job done" : "");
-    if (!stop) { // a task that cannot be stopped, or has ended
+        // Double-clicking a row with a problem shows its message.
+        dialog()->doubleClick(model->index(1, 0));
+        QCOMPARE(child<QStackedWidget>("_stackedWidget")->currentIndex(), more ? 1 : 0);
+        QCOMPARE(dialog()->windowTitle(), more ? title : "Tasks");
+        QCOMPARE(child<QPlainTextEdit>("_errorPlainTextEdit")->toPlainText(), more ? "job done" : "");
+        if (!stop) { // a task that cannot be stopped, or has ended
+            QVERIFY(!requestStop(1));
+            return;
+        }
+        // A stop request is taken once, shown in a status text spelled so on
+        // purpose; the task notices it and ends with a warning.
+        stopButton->click();
+        QCOMPARE(model->index(1, 1).data().toString(), QStringLiteral("about to be stop"));
+        QVERIFY(!stopButton->isEnabled());
         QVERIFY(!requestStop(1));
-        return;
+        QTRY_COMPARE(status(1), int(TaskDescription::Warning));
+        QCOMPARE(model->index(1, 2).data().toString(), QStringLiteral("stopped on request"));
+        QVERIFY(!requestStop(1));
     }
-    // A stop request is taken once, shown in a status text spelled so on
-    // purpose; the task notices it and ends with a warning.
-    stopButton->click();
-    QCOMPARE(model->index(1, 1).data().toString(), QStringLiteral("about to be stop"));
-    QVERIFY(!stopButton->isEnabled());
-    QVERIFY(!requestStop(1));
-    QTRY_COMPARE(status(1), int(TaskDescription::Warning));
-    QCOMPARE(model->index(1, 2).data().toString(), QStringLiteral("stopped on request"));
-    QVERIFY(!requestStop(1));
-}
+};
 
 QTEST_MAIN(TaskObserverTest)
 #include "tst_taskobserver.moc"
