@@ -6,6 +6,7 @@
 #include "taskobservermodel.h"
 #include "taskperformedevent.h"
 #include "thread.h"
+#include "kvtlogging_p.h"
 
 #include <QTimer>
 #include <QWidget>
@@ -72,7 +73,7 @@ void TaskObserver::performTask(AbstractTask *task)
         // No worker has a free slot (or none has started). The task does
         // not run; it is reported as failed and deleted, so that it is
         // neither leaked nor left "processing" for ever.
-        qWarning("TaskObserver: task \"%s\" refused, the task queue is full or no worker runs",
+        qCWarning(KVT_TASK, "TaskObserver: task \"%s\" refused, the task queue is full or no worker runs",
                  qPrintable(task->taskDescription().description()));
         task->taskDescription().setStatus(TaskDescription::Fail);
         task->taskDescription().setMessage(tr("The task was not started: no worker thread is free."));
