@@ -86,7 +86,9 @@ protected:
     PluginDialog *_pluginDialog;
 
 private:
-    void loadPlugin(const QString &filePath);
+    void loadDirectory(const QString &directory);
+    bool loadPlugin(const QString &filePath);
+    void unloadWhileLoading();
 };
 
 #endif // KVT_PLUGINCONTAINER_H

@@ -35,11 +35,13 @@ public:
     /*!
      * Queues \a task for the workers; only the interface thread calls it.
      * Returns false at once, without taking the task, when it is null or no
-     * slot is free (also before any worker has started).
+     * slot is free (also before any worker has started), and once the
+     * workers have been stopped.
      */
     static bool put(AbstractTask *task);
 
-    int threadIndex() const { return _threadIndex; }
+    //! The worker's place among the started workers; -1 until it starts.
+    int threadIndex() const { return _threadIndex.load(std::memory_order_acquire); }
 
 protected:
     void run() override;
@@ -47,7 +49,8 @@ protected:
 private:
     static void takeFilledSlot();
 
-    int _threadIndex;
+    // Written by the worker when it starts, read by the interface thread.
+    std::atomic<int> _threadIndex;
 
     static AbstractTask *_buffer[BufferSize];
     static int _frontBound;
@@ -58,5 +61,7 @@ private:
     static std::atomic<bool> _stopThread;
     static QAtomicInt _threadsCount;
 };
+
+static_assert(sizeof(std::atomic<int>) == sizeof(int), "the thread index keeps the size of an int");
 
 #endif // KVT_THREAD_H
