@@ -9,8 +9,7 @@
  * A node for tests: shows its id in column 0 and "<id>:<column>" in the other
  * columns, accepts edits of column 0 (the edit becomes its display text), and
  * lets a test choose its column count, special flags and whether it can fetch
- * more, record afterLoad()
- * calls and count destructions.
+ * more, record afterLoad() calls and count destructions.
  */
 class TestTreeNode : public TreeNode
 {

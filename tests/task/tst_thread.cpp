@@ -127,6 +127,10 @@ private Q_SLOTS:
         });
         worker.reset();
         opener.join();
+        // A stopped ring takes nothing more: such a task would never run nor
+        // be freed.
+        TestTask late(nullptr, QStringLiteral("late"));
+        QVERIFY(!Thread::put(&late));
         QCOMPARE(int(queued.destroyed), 3);
         QTRY_COMPARE(observer->runningCount(), 0);
         for (int row = 1; row <= 3; ++row) {
@@ -138,10 +142,8 @@ private Q_SLOTS:
         QCOMPARE(model->index(0, 1).data(Qt::EditRole).toInt(), int(TaskDescription::Success));
         QCOMPARE(observer->problemCount(), 3);
 
-        // A stopped ring takes nothing more: such a task would never run nor
-        // be freed. Through the observer it is reported failed and freed.
-        TestTask late(nullptr, QStringLiteral("late"));
-        QVERIFY(!Thread::put(&late));
+        // Through the observer, a task the stopped ring refuses is reported
+        // failed and freed.
         TestTask::Counters refused;
         QTest::ignoreMessage(QtWarningMsg, QRegularExpression(QStringLiteral("\"after stop\" refused")));
         observer->performTask(new TestTask(&refused, QStringLiteral("after stop")));
