@@ -2,6 +2,7 @@
 
 #include "abstracttask.h"
 #include "blockdialog.h"
+#include "handover_p.h"
 #include "taskobserverdialog.h"
 #include "taskobservermodel.h"
 #include "taskperformedevent.h"
@@ -39,6 +40,10 @@ SharedState &shared()
 
 // The observer whose destructor is handing out the completions still queued.
 const TaskObserver *dyingObserver = nullptr;
+
+// Addresses that mark the queued calls made by workers (see handover_p.h).
+const char completionRelay = 0;
+const char settleRequest = 0;
 
 bool inInterfaceThread()
 {
@@ -80,7 +85,9 @@ void TaskObserver::postCompletion(AbstractTask *task)
     {
         QMutexLocker locker(&shared().mutex);
         if (_instance) {
-            QCoreApplication::postEvent(_instance, new TaskPerformedEvent(task));
+            auto *event = new TaskPerformedEvent(task);
+            KvtHandOver::handOver(event);
+            QCoreApplication::postEvent(_instance, event);
             return;
         }
     }
@@ -97,7 +104,9 @@ void TaskObserver::postCompletion(AbstractTask *task)
         QCoreApplication::postEvent(instance(), new TaskPerformedEvent(task));
         return;
     }
+    KvtHandOver::handOver(&completionRelay);
     QMetaObject::invokeMethod(app, [task] {
+        KvtHandOver::takeOver(&completionRelay);
         QCoreApplication::postEvent(TaskObserver::instance(), new TaskPerformedEvent(task));
     }, Qt::QueuedConnection);
 }
@@ -113,8 +122,11 @@ void TaskObserver::taskDestroyed(AbstractTask *task)
     shared().droppedListed.append(task);
     if (_instance) {
         TaskObserver *observer = _instance;
-        QMetaObject::invokeMethod(observer, [observer] { observer->settleDroppedTasks(); },
-                                  Qt::QueuedConnection);
+        KvtHandOver::handOver(&settleRequest);
+        QMetaObject::invokeMethod(observer, [observer] {
+            KvtHandOver::takeOver(&settleRequest);
+            observer->settleDroppedTasks();
+        }, Qt::QueuedConnection);
     }
 }
 
@@ -335,6 +347,7 @@ bool TaskObserver::requestStop(int row)
 bool TaskObserver::event(QEvent *event)
 {
     if (event->type() == TaskPerformedEvent::EventType) {
+        KvtHandOver::takeOver(event);
         taskPerformedEvent(static_cast<TaskPerformedEvent *>(event));
         event->accept();
         return true;
