@@ -4,12 +4,14 @@
 #ifndef KVT_HANDOVER_P_H
 #define KVT_HANDOVER_P_H
 
-// Work handed from one thread to another through Qt's event queue (a posted
-// event, a queued call) is ordered by locks inside QtCore. A ThreadSanitizer
+// Work handed from one thread to another through Qt (a posted event, a
+// queued call, a QMutex) is ordered by locks inside QtCore. A ThreadSanitizer
 // build of this library does not see into an uninstrumented QtCore, so the
 // two ends of each hand-over say so themselves: handOver() in the sending
-// thread before posting, takeOver() on the same address in the receiving
-// thread before touching what was sent. Both do nothing in other builds.
+// thread before posting or unlocking, takeOver() on the same address in the
+// receiving thread after receiving or locking, before touching what was
+// sent. Both do nothing in other builds. Locker is a QMutexLocker that does
+// so for the mutex it holds.
 
 #if defined(__SANITIZE_THREAD__)
 #define KVT_THREAD_SANITIZER 1
@@ -19,6 +21,7 @@
 #endif
 #endif
 
+#include <QMutex>
 #include <QtGlobal>
 
 #ifdef KVT_THREAD_SANITIZER
@@ -44,6 +47,27 @@ inline void takeOver(const void *address)
     Q_UNUSED(address)
 #endif
 }
+
+class Locker
+{
+public:
+    explicit Locker(QMutex *mutex)
+        : m_mutex(mutex)
+    {
+        m_mutex->lock();
+        takeOver(m_mutex);
+    }
+    ~Locker()
+    {
+        handOver(m_mutex);
+        m_mutex->unlock();
+    }
+    Locker(const Locker &) = delete;
+    Locker &operator=(const Locker &) = delete;
+
+private:
+    QMutex *m_mutex;
+};
 
 } // namespace KvtHandOver
 

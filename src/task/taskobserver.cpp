@@ -66,12 +66,12 @@ TaskObserver *TaskObserver::instance(QObject *parent)
     if (inInterfaceThread()) {
         if (!_instance) {
             TaskObserver *observer = new TaskObserver(parent);
-            QMutexLocker locker(&shared().mutex);
+            KvtHandOver::Locker locker(&shared().mutex);
             _instance = observer;
         }
         return _instance;
     }
-    QMutexLocker locker(&shared().mutex);
+    KvtHandOver::Locker locker(&shared().mutex);
     if (!_instance) {
         // Made here, the observer and its dialogs would live in a worker that
         // has no event loop: completions would never arrive.
@@ -83,7 +83,7 @@ TaskObserver *TaskObserver::instance(QObject *parent)
 void TaskObserver::postCompletion(AbstractTask *task)
 {
     {
-        QMutexLocker locker(&shared().mutex);
+        KvtHandOver::Locker locker(&shared().mutex);
         if (_instance) {
             auto *event = new TaskPerformedEvent(task);
             KvtHandOver::handOver(event);
@@ -113,7 +113,7 @@ void TaskObserver::postCompletion(AbstractTask *task)
 
 void TaskObserver::taskDestroyed(AbstractTask *task)
 {
-    QMutexLocker locker(&shared().mutex);
+    KvtHandOver::Locker locker(&shared().mutex);
     if (!shared().listed.remove(task))
         return;
     // Destroyed while its row still points at it: dropped by a stopping
@@ -150,7 +150,7 @@ TaskObserver::TaskObserver(QObject *parent)
 TaskObserver::~TaskObserver()
 {
     {
-        QMutexLocker locker(&shared().mutex);
+        KvtHandOver::Locker locker(&shared().mutex);
         if (_instance == this)
             _instance = nullptr;
         // Tasks still running report to the next observer; their rows go
@@ -194,7 +194,7 @@ void TaskObserver::performTask(AbstractTask *task)
     _taskRows.insert(task, row);
     _rows.append(Row{task->taskDescription(), task});
     {
-        QMutexLocker locker(&shared().mutex);
+        KvtHandOver::Locker locker(&shared().mutex);
         shared().listed.insert(task);
     }
     Q_EMIT tasksInserted(row, row);
@@ -291,7 +291,7 @@ void TaskObserver::forgetTask(AbstractTask *task)
     if (*it >= 0 && *it < _rows.size())
         _rows[*it].task = nullptr;
     _taskRows.erase(it);
-    QMutexLocker locker(&shared().mutex);
+    KvtHandOver::Locker locker(&shared().mutex);
     shared().listed.remove(task);
 }
 
@@ -299,7 +299,7 @@ void TaskObserver::settleDroppedTasks()
 {
     QList<const AbstractTask *> dropped;
     {
-        QMutexLocker locker(&shared().mutex);
+        KvtHandOver::Locker locker(&shared().mutex);
         dropped.swap(shared().droppedListed);
     }
     for (const AbstractTask *gone : qAsConst(dropped)) {
@@ -322,7 +322,7 @@ quint64 TaskObserver::rowTaskSpecialFlags(int row) const
     if (row < 0 || row >= _rows.size() || !_rows.at(row).task)
         return 0;
     const AbstractTask *task = _rows.at(row).task;
-    QMutexLocker locker(&shared().mutex);
+    KvtHandOver::Locker locker(&shared().mutex);
     return shared().listed.contains(task) ? task->taskSpecialFlags() : 0;
 }
 
@@ -334,7 +334,7 @@ bool TaskObserver::requestStop(int row)
     if (entry.description.status() != TaskDescription::Processing || !entry.task)
         return false;
     // Held while the task is asked: a stopping worker cannot delete it meanwhile.
-    QMutexLocker locker(&shared().mutex);
+    KvtHandOver::Locker locker(&shared().mutex);
     if (!shared().listed.contains(entry.task))
         return false;
     if (!(entry.task->taskSpecialFlags() & AbstractTask::StoppableFlag)
@@ -368,7 +368,7 @@ void TaskObserver::clearTasks()
     _runningCount = 0;
     _problemCount = 0;
     {
-        QMutexLocker locker(&shared().mutex);
+        KvtHandOver::Locker locker(&shared().mutex);
         for (auto it = _taskRows.cbegin(); it != _taskRows.cend(); ++it)
             shared().listed.remove(it.key());
     }

@@ -1,6 +1,7 @@
 #include "thread.h"
 
 #include "abstracttask.h"
+#include "handover_p.h"
 
 #include <QList>
 
@@ -24,7 +25,7 @@ Thread::~Thread()
     {
         // Under the ring's lock, so that a put() either lands before the stop
         // (and is dropped by the stop walk) or sees it and refuses the task.
-        QMutexLocker locker(&_frontBoundMutex);
+        KvtHandOver::Locker locker(&_frontBoundMutex);
         _stopThread.store(true);
     }
     _fullBuffer.release(1);
@@ -38,7 +39,7 @@ bool Thread::put(AbstractTask *task)
     {
         // The lock orders the store with the stop walk of the first worker,
         // which reads and clears the same slots.
-        QMutexLocker locker(&_frontBoundMutex);
+        KvtHandOver::Locker locker(&_frontBoundMutex);
         // Once stopped, no worker takes anything out of the ring again: a
         // task accepted now would never run and never be freed.
         if (_stopThread.load())
@@ -79,7 +80,7 @@ void Thread::run()
 {
     int index = -1;
     {
-        QMutexLocker locker(&_frontBoundMutex);
+        KvtHandOver::Locker locker(&_frontBoundMutex);
         index = _threadsCount.fetchAndAddOrdered(1);
         _threadIndex.store(index, std::memory_order_release);
         if (index == 0) {
@@ -97,7 +98,7 @@ void Thread::run()
             break;
         AbstractTask *task = nullptr;
         {
-            QMutexLocker locker(&_frontBoundMutex);
+            KvtHandOver::Locker locker(&_frontBoundMutex);
             task = _buffer[_frontBound];
             _buffer[_frontBound] = nullptr;
             _frontBound = (_frontBound + 1) % BufferSize;
@@ -114,7 +115,7 @@ void Thread::run()
         // only waiting tasks are found.
         QList<AbstractTask *> dropped;
         {
-            QMutexLocker locker(&_frontBoundMutex);
+            KvtHandOver::Locker locker(&_frontBoundMutex);
             for (int n = 0; n < BufferSize; ++n) {
                 const int i = (_frontBound + n) % BufferSize;
                 if (_buffer[i])

@@ -178,8 +178,10 @@ private Q_SLOTS:
             }
             void run() override
             {
+                // The observer may delete the task as soon as it is posted.
+                QSemaphore *done = posted;
                 TestTask::run();
-                posted->release(); // the completion is on its way
+                done->release(); // the completion is on its way
             }
             QThread **thread;
             QSemaphore *posted = nullptr;
