@@ -1,13 +1,15 @@
 # Thin wrapper over CMake. The build folder is build/ (build-asan/ for the
-# sanitizer build).
+# sanitizer build, build-fuzz/ for the fuzz targets).
 
 BUILD      ?= build
 ASAN_BUILD ?= build-asan
+FUZZ_BUILD ?= build-fuzz
+FUZZ_SECONDS ?= 60
 JOBS       ?= $(shell nproc 2>/dev/null || echo 2)
 CMAKE_ARGS ?=
 PREFIX     ?= /usr/local
 
-.PHONY: all deps configure build test demo bench install asan-test clean lupdate
+.PHONY: all deps configure build test demo bench install asan-test fuzz fuzz-run clean lupdate
 
 all: build
 
@@ -37,8 +39,17 @@ asan-test: deps
 	cmake --build $(ASAN_BUILD) -j $(JOBS)
 	cd $(ASAN_BUILD) && ctest --output-on-failure -j $(JOBS)
 
+# libFuzzer targets (clang) for the parsers and the configuration line handling.
+fuzz: deps
+	cmake -S fuzz -B $(FUZZ_BUILD) -DCMAKE_CXX_COMPILER=clang++ $(CMAKE_ARGS)
+	cmake --build $(FUZZ_BUILD) -j $(JOBS)
+
+# Each fuzz target for FUZZ_SECONDS, from the seed corpus in fuzz/corpus/.
+fuzz-run: fuzz
+	sh fuzz/run.sh $(FUZZ_BUILD) $(FUZZ_SECONDS)
+
 lupdate: configure
 	cmake --build $(BUILD) --target lupdate
 
 clean:
-	rm -rf $(BUILD) $(ASAN_BUILD)
+	rm -rf $(BUILD) $(ASAN_BUILD) $(FUZZ_BUILD)
