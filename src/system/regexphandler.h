@@ -75,7 +75,8 @@ public:
     /*!
      * Copies \a source over \a destination with
      * "cp --force --preserve=mode,ownership", waiting up to 30 seconds for the
-     * start and again for the end.
+     * start and again for the end. A relative path that begins with "-" is
+     * given to cp as "./-..." so that it is not taken for an option.
      */
     static bool safeCopy(const QString &source, const QString &destination, QString &error);
 

@@ -253,9 +253,9 @@ private Q_SLOTS:
         const auto logAgain = qScopeGuard([] { QLoggingCategory::setFilterRules(QString()); });
 
 #ifdef __SANITIZE_ADDRESS__
-        const int defaultTrials = 100; // each child is several times slower
+        const int defaultTrials = 80; // each child is several times slower
 #else
-        const int defaultTrials = 300;
+        const int defaultTrials = 200;
 #endif
         const int trials = qEnvironmentVariableIsSet("KVT_KILL_TRIALS") ? qEnvironmentVariableIntValue("KVT_KILL_TRIALS")
                                                                          : defaultTrials;
