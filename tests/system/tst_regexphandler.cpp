@@ -408,13 +408,14 @@ private Q_SLOTS:
     void optionLikeNames()
     {
         // Relative names beginning with "-" are files to cp, not options.
+        const QString savedCurrent = QDir::currentPath();
         QVERIFY(QDir::setCurrent(_dir->path()));
         QVERIFY(writeFile(QStringLiteral("-a"), "key = 1\n"));
         QString error;
         const bool copied = RegExpHandler::safeCopy(QStringLiteral("-a"), QStringLiteral("-b"), error);
         KeyValueHandler handler(QStringLiteral("key=2"));
         const bool rewritten = RegExpHandler::rewriteSystemConfigureFile(QStringLiteral("-b"), handler, error, true);
-        QVERIFY(QDir::setCurrent(QDir::tempPath()));
+        QVERIFY(QDir::setCurrent(savedCurrent));
         QVERIFY2(copied && rewritten, qPrintable(error));
         QCOMPARE(folderState(), (QStringList{"-a=key = 1\n", "-b.bak=key = 1\n", "-b=key = 2\n"}));
     }
