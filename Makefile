@@ -1,9 +1,12 @@
 # Thin wrapper over CMake. The build folder is build/ (build-asan/ for the
-# address sanitizer build, build-tsan/ for the thread sanitizer build).
+# address sanitizer build, build-tsan/ for the thread sanitizer build,
+# build-fuzz/ for the fuzz targets).
 
 BUILD      ?= build
 ASAN_BUILD ?= build-asan
 TSAN_BUILD ?= build-tsan
+FUZZ_BUILD ?= build-fuzz
+FUZZ_SECONDS ?= 60
 # The tests that run work on threads: tasks, observer, service tasks,
 # processes, PostgreSQL.
 TSAN_TARGETS ?= tst_thread tst_taskobserver tst_elementtasks tst_servicetasks tst_process tst_pgsql
@@ -12,7 +15,7 @@ JOBS       ?= $(shell nproc 2>/dev/null || echo 2)
 CMAKE_ARGS ?=
 PREFIX     ?= /usr/local
 
-.PHONY: all deps configure build test demo bench install asan-test tsan-test clean lupdate
+.PHONY: all deps configure build test demo bench install asan-test tsan-test fuzz fuzz-run clean lupdate
 
 all: build
 
@@ -47,8 +50,17 @@ tsan-test: deps
 	cmake --build $(TSAN_BUILD) -j $(JOBS) --target $(TSAN_TARGETS)
 	cd $(TSAN_BUILD) && ctest --output-on-failure -j $(JOBS) -R '$(TSAN_TESTS)'
 
+# libFuzzer targets (clang) for the parsers and the configuration line handling.
+fuzz: deps
+	cmake -S fuzz -B $(FUZZ_BUILD) -DCMAKE_CXX_COMPILER=clang++ $(CMAKE_ARGS)
+	cmake --build $(FUZZ_BUILD) -j $(JOBS)
+
+# Each fuzz target for FUZZ_SECONDS, from the seed corpus in fuzz/corpus/.
+fuzz-run: fuzz
+	sh fuzz/run.sh $(FUZZ_BUILD) $(FUZZ_SECONDS)
+
 lupdate: configure
 	cmake --build $(BUILD) --target lupdate
 
 clean:
-	rm -rf $(BUILD) $(ASAN_BUILD) $(TSAN_BUILD)
+	rm -rf $(BUILD) $(ASAN_BUILD) $(TSAN_BUILD) $(FUZZ_BUILD)

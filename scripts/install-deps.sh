@@ -23,6 +23,8 @@ coreutils
 util-linux
 postgresql
 postgresql-client
+clang
+libclang-rt-dev
 "
 
 missing=""

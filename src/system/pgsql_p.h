@@ -1,6 +1,8 @@
 #ifndef KVT_PGSQL_P_H
 #define KVT_PGSQL_P_H
 
+#include <QStringList>
+
 // Fixed texts of the PostgreSQL helpers.
 namespace KvtPgsql {
 
@@ -13,6 +15,11 @@ inline constexpr char userListQuery[] = "SELECT u.usename FROM pg_catalog.pg_use
 // clusters through pg_ctlcluster only.
 inline constexpr char serviceControlProgram[] = "/bin/systemctl";
 inline constexpr char serviceUnitName[] = "postgresql";
+
+// The user names in psql's output of the user list query: the lines between
+// the dashed header rule and the row-count footer, trimmed, empty ones
+// skipped. False when the output has no such header and footer.
+bool parseUserList(const QString &output, QStringList *users);
 
 } // namespace KvtPgsql
 

@@ -19,8 +19,9 @@ const QRegularExpression userListExpression(
     QRegularExpression::DotMatchesEverythingOption);
 
 // Unquoted identifiers are folded to lower case by the server, so only
-// lower-case ones come back from the user list as they were written.
-const QRegularExpression plainIdentifier(QStringLiteral("^[a-z_][a-z0-9_]{0,62}$"));
+// lower-case ones come back from the user list as they were written. "\\z"
+// and not "$": the latter also matches before a final newline.
+const QRegularExpression plainIdentifier(QStringLiteral("\\A[a-z_][a-z0-9_]{0,62}\\z"));
 
 // Characters that keep their meaning inside the double quotes of the su
 // command line, or end it.
@@ -44,6 +45,18 @@ bool leavesShellQuotes(const QString &text)
 }
 
 } // namespace
+
+bool KvtPgsql::parseUserList(const QString &output, QStringList *users)
+{
+    const QRegularExpressionMatch match = userListExpression.match(output);
+    if (!match.hasMatch())
+        return false;
+    // The row count in the footer is not checked against the names.
+    *users = splitSkippingEmpty(match.captured(QStringLiteral("users")), QLatin1Char('\n'));
+    for (QString &name : *users)
+        name = name.trimmed();
+    return true;
+}
 
 PgsqlCluster::PgsqlCluster(QObject *parent)
     : QObject(parent)
@@ -105,14 +118,9 @@ QString PgsqlCluster::sqlRequest(const QString &query) const
 QStringList PgsqlCluster::usernames() const
 {
     const QString query = QLatin1String(KvtPgsql::userListQuery);
-    const QRegularExpressionMatch match = userListExpression.match(sqlRequest(query));
-    if (!match.hasMatch())
+    QStringList names;
+    if (!KvtPgsql::parseUserList(sqlRequest(query), &names))
         throw AppException(tr("SQL request '%1' not mathed").arg(query));
-
-    // The row count in the footer is not checked against the names.
-    QStringList names = splitSkippingEmpty(match.captured(QStringLiteral("users")), QLatin1Char('\n'));
-    for (QString &name : names)
-        name = name.trimmed();
     return names;
 }
 

@@ -20,8 +20,10 @@ class PgsqlCluster;
  * from this object's thread with the clusters parsed before the failure. The
  * clusters belong to the object and are replaced by the next read.
  *
- * One read at a time: startReadClusters() while a read runs does nothing, and
- * that read reports. Destruction waits for a running read to end.
+ * One read at a time: startReadClusters() while a read runs, or before its
+ * clustersReaded() has been delivered, starts one more read once that one has
+ * reported (several such requests make one read). Destruction waits for a
+ * running read to end.
  */
 class KVTCOMMON_EXPORT PgsqlManagerAsync : public QObject
 {

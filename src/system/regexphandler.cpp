@@ -1,19 +1,26 @@
 #include "regexphandler.h"
 
-#include "regexpprefilter_p.h"
+#include "configlines_p.h"
+#include "kvtlogging_p.h"
 
 #include <QFile>
+#include <QFileInfo>
 #include <QObject>
 #include <QProcess>
 #include <QStringList>
-#include <QTextCodec>
 
+#include <cerrno>
+#include <cstdio>
+#include <cstdlib>
 #include <cstring>
+#include <vector>
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
 
 namespace {
 
 const int copyTimeoutMs = 30000;
-const int outputBlockSize = 1 << 20;
 
 void appendError(QString &error, const QString &message)
 {
@@ -33,135 +40,300 @@ void appendFileError(QString &error, const QFileDevice &file)
                            .arg(file.fileName(), QString::number(int(file.error())), file.errorString()));
 }
 
-// Lines are read in large blocks rather than one readLine() at a time: a
-// rewrite of a big file spends most of its time there otherwise. A line is
-// what readLine() would give: everything up to and including the next '\n',
-// or the rest of the file.
-class LineReader
+// The same message for a failed system call on \a fileName.
+void appendSystemError(QString &error, const QString &fileName, QFileDevice::FileError kind, int errorCode)
+{
+    appendError(error, QObject::tr("\"%1\" error %2\n%3")
+                           .arg(fileName, QString::number(int(kind)), qt_error_string(errorCode)));
+}
+
+void appendForeignWorkFile(QString &error, const QString &workName)
+{
+    appendError(error, QObject::tr("\"%1\" is not a regular file of its own (a link, a device or another user's file); "
+                                   "nothing was written through it")
+                           .arg(workName));
+}
+
+class FileDescriptor
 {
 public:
-    explicit LineReader(QFile &file)
-        : _file(file)
+    explicit FileDescriptor(int fd = -1)
+        : _fd(fd)
     {
     }
+    ~FileDescriptor() { reset(); }
+    FileDescriptor(const FileDescriptor &) = delete;
+    FileDescriptor &operator=(const FileDescriptor &) = delete;
 
-    // Points \a data and \a size at the next line; false at end of file (or
-    // on a read error, which the file then reports).
-    bool next(const char *&data, int &size)
+    int get() const { return _fd; }
+    bool isValid() const { return _fd >= 0; }
+    void reset(int fd = -1)
     {
-        for (;;) {
-            const int available = _buffer.size() - _position;
-            const char *start = _buffer.constData() + _position;
-            if (available > 0 && _searched < available) {
-                const void *newline = std::memchr(start + _searched, '\n', size_t(available - _searched));
-                if (newline) {
-                    data = start;
-                    size = int(static_cast<const char *>(newline) - start) + 1;
-                    _position += size;
-                    _searched = 0;
-                    return true;
-                }
-                _searched = available;
-            }
-            if (_atEnd) {
-                if (available == 0)
-                    return false;
-                data = start;
-                size = available;
-                _position = _buffer.size();
-                _searched = 0;
-                return true;
-            }
-            fill();
-        }
+        if (_fd >= 0)
+            ::close(_fd);
+        _fd = fd;
     }
 
 private:
-    void fill()
-    {
-        // Keep the unfinished line, then append the next block after it.
-        if (_position > 0) {
-            _buffer.remove(0, _position);
-            _position = 0;
-        }
-        const int kept = _buffer.size();
-        _buffer.resize(kept + blockSize);
-        const qint64 got = _file.read(_buffer.data() + kept, blockSize);
-        _buffer.resize(kept + int(qMax<qint64>(got, 0)));
-        if (got <= 0)
-            _atEnd = true;
-    }
-
-    static const int blockSize = 1 << 20;
-    QFile &_file;
-    QByteArray _buffer;
-    int _position = 0;
-    int _searched = 0; // bytes after _position known to hold no '\n'
-    bool _atEnd = false;
+    int _fd;
 };
 
-bool isAsciiSpace(char c)
+bool sameTime(const struct timespec &a, const struct timespec &b)
 {
-    return c == ' ' || (c >= '\t' && c <= '\r');
+    return a.tv_sec == b.tv_sec && a.tv_nsec == b.tv_nsec;
 }
 
-// True when every character the locale codec produces from an ASCII byte is
-// that byte, whatever surrounds it; then the text before a comment can be
-// found in the raw bytes without decoding the whole line.
-bool localeKeepsAscii()
+// Flushes the content of \a fileName to the disk.
+bool syncFile(const QString &fileName, QString &error)
 {
-    const QTextCodec *codec = QTextCodec::codecForLocale();
-    if (!codec)
-        return false;
-    switch (codec->mibEnum()) {
-    case 3:   // US-ASCII
-    case 4:   // ISO-8859-1
-    case 106: // UTF-8
-    case 111: // ISO-8859-15
-        return true;
-    default:
+    const FileDescriptor fd(::open(QFile::encodeName(fileName).constData(), O_RDONLY | O_CLOEXEC));
+    if (!fd.isValid() || ::fsync(fd.get()) != 0) {
+        appendSystemError(error, fileName, QFileDevice::WriteError, errno);
         return false;
     }
+    return true;
 }
 
-// Line selection shared by both traversals: whether the line is a candidate
-// (the text before its first '#', trimmed, is not empty) and the handler's
-// expression is found in that text. No quoting is understood: a '#' inside a
-// quoted value starts the comment all the same.
-bool lineMatches(RegExpHandler &handler, RegExpPrefilter &prefilter, const char *data, int size,
-                 bool asciiShortcut)
+// Makes the names in the folder of \a fileName durable. Some file systems
+// cannot sync a folder; their names are as durable as they get.
+void syncFolder(const QString &fileName)
 {
-    // The decoded line stops at the first NUL byte.
-    if (const void *nul = std::memchr(data, '\0', size_t(size)))
-        size = int(static_cast<const char *>(nul) - data);
+    const FileDescriptor fd(
+        ::open(QFile::encodeName(QFileInfo(fileName).absolutePath()).constData(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    if (fd.isValid() && ::fsync(fd.get()) != 0 && errno != EINVAL && errno != EROFS)
+        qCWarning(KVT_SYSTEM, "cannot sync the folder of %s: %s", qPrintable(fileName), qPrintable(qt_error_string(errno)));
+}
 
-    if (asciiShortcut) {
-        const void *hash = std::memchr(data, '#', size_t(size));
-        const int end = hash ? int(static_cast<const char *>(hash) - data) : size;
-        bool ascii = true;
-        for (int i = 0; i < end && ascii; ++i)
-            ascii = static_cast<unsigned char>(data[i]) < 0x80;
-        if (ascii) {
-            int first = 0;
-            int last = end;
-            while (first < last && isAsciiSpace(data[first]))
-                ++first;
-            while (last > first && isAsciiSpace(data[last - 1]))
-                --last;
-            if (first == last)
+// Whether the content of \a a equals that of \a b, or (with \a prefix) is
+// a strict beginning of it. Both are read from their start.
+bool compareContent(int a, int b, bool prefix)
+{
+    struct stat sa = {};
+    struct stat sb = {};
+    if (::fstat(a, &sa) != 0 || ::fstat(b, &sb) != 0 || (prefix ? sa.st_size >= sb.st_size : sa.st_size != sb.st_size))
+        return false;
+    if (::lseek(a, 0, SEEK_SET) != 0 || ::lseek(b, 0, SEEK_SET) != 0)
+        return false;
+    static const size_t blockSize = 1 << 16;
+    std::vector<char> blockA(blockSize);
+    std::vector<char> blockB(blockSize);
+    for (;;) {
+        const ssize_t got = ::read(a, blockA.data(), blockSize);
+        if (got < 0)
+            return false;
+        if (got == 0)
+            return true;
+        ssize_t have = 0;
+        while (have < got) {
+            const ssize_t more = ::read(b, blockB.data() + have, size_t(got - have));
+            if (more <= 0)
                 return false;
-            if (prefilter.usable(handler.regExp()) && !prefilter.canMatch(data + first, last - first))
-                return false;
-            return handler.regExp().indexIn(QString::fromLatin1(data + first, last - first), 0) != -1;
+            have += more;
         }
+        if (std::memcmp(blockA.data(), blockB.data(), size_t(got)) != 0)
+            return false;
+    }
+}
+
+// A work copy "<file>.tmp" found beside the file: left by an interrupted
+// rewrite, or something else that happens to carry the name.
+struct WorkFileTrace {
+    enum Kind { None, Foreign, Unreadable, Own };
+    Kind kind = None;
+    int errorCode = 0;
+    FileDescriptor fd;
+    struct stat status = {};
+};
+
+// Opens the work copy without following a link and without waiting on a
+// device or a pipe. It is the library's own only when it is a regular file
+// with no other name, owned by this user or by the file's owner.
+void inspectWorkFile(const QString &workName, const struct stat &target, WorkFileTrace &trace)
+{
+    trace.fd.reset(::open(QFile::encodeName(workName).constData(),
+                          O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
+    if (!trace.fd.isValid()) {
+        trace.errorCode = errno;
+        trace.kind = errno == ENOENT ? WorkFileTrace::None
+                     : errno == ELOOP ? WorkFileTrace::Foreign
+                                      : WorkFileTrace::Unreadable;
+        if (trace.kind == WorkFileTrace::Unreadable) {
+            // Not readable by us, yet perhaps not a regular file either.
+            struct stat st = {};
+            if (::lstat(QFile::encodeName(workName).constData(), &st) == 0 && !S_ISREG(st.st_mode))
+                trace.kind = WorkFileTrace::Foreign;
+        }
+        return;
+    }
+    if (::fstat(trace.fd.get(), &trace.status) != 0) {
+        trace.errorCode = errno;
+        trace.kind = WorkFileTrace::Unreadable;
+        return;
+    }
+    const bool own = S_ISREG(trace.status.st_mode) && trace.status.st_nlink == 1
+                     && (trace.status.st_uid == ::geteuid() || trace.status.st_uid == target.st_uid);
+    trace.kind = own ? WorkFileTrace::Own : WorkFileTrace::Foreign;
+}
+
+// The new content of a rewrite, written first into a file without a name in
+// the folder of the file, and given the work name only once it is complete
+// and on the disk. So "<file>.tmp" always holds a whole new version: while it
+// is copied back over the file, and after an interruption, it is the copy
+// that is complete.
+class WorkFile
+{
+public:
+    explicit WorkFile(const QString &name)
+        : _name(name)
+        , _native(QFile::encodeName(name))
+    {
+    }
+    ~WorkFile()
+    {
+        _fd.reset();
+        if (!_tempName.isEmpty() && !_published)
+            ::unlink(_tempName.constData());
     }
 
-    const QString decoded = QString::fromLocal8Bit(data, size);
-    const int commentStart = decoded.indexOf(QLatin1Char('#'));
-    const QString text = (commentStart < 0 ? decoded : decoded.left(commentStart)).trimmed();
-    if (text.isEmpty())
+    int handle() const { return _fd.get(); }
+
+    // Creates the nameless file with the mode and owner of \a target.
+    bool create(const struct stat &target, QString &error)
+    {
+        const QByteArray folder = QFile::encodeName(QFileInfo(_name).absolutePath());
+        _fd.reset(::open(folder.constData(), O_TMPFILE | O_WRONLY | O_CLOEXEC, 0600));
+        if (!_fd.isValid() && (errno == EOPNOTSUPP || errno == EISDIR || errno == EINVAL)) {
+            // The file system has no nameless files: a unique name beside the
+            // work name stands in, and a failure removes it.
+            QByteArray pattern = _native + ".XXXXXX";
+            _fd.reset(::mkostemp(pattern.data(), O_CLOEXEC));
+            if (_fd.isValid())
+                _tempName = pattern;
+        }
+        if (!_fd.isValid()) {
+            appendSystemError(error, _name, QFileDevice::OpenError, errno);
+            return false;
+        }
+        // As cp --preserve=mode,ownership does: without the right to give the
+        // file away it stays ours, and then loses its set-id bits.
+        mode_t mode = target.st_mode & 07777;
+        if (::fchown(_fd.get(), target.st_uid, target.st_gid) != 0) {
+            if (errno != EPERM && errno != EINVAL) {
+                appendSystemError(error, _name, QFileDevice::PermissionsError, errno);
+                return false;
+            }
+            mode &= ~mode_t(S_ISUID | S_ISGID);
+        }
+        if (::fchmod(_fd.get(), mode) != 0) {
+            appendSystemError(error, _name, QFileDevice::PermissionsError, errno);
+            return false;
+        }
+        return true;
+    }
+
+    // Puts the complete content on the disk and gives the file its name.
+    // Its modification time is set to the file's: a trace of a rewrite that
+    // stopped before copying back is recognised by it.
+    bool publish(const struct stat &target, QString &error)
+    {
+        const struct timespec times[2] = {target.st_atim, target.st_mtim};
+        if (::futimens(_fd.get(), times) != 0 || ::fsync(_fd.get()) != 0) {
+            appendSystemError(error, _name, QFileDevice::WriteError, errno);
+            return false;
+        }
+        int result = 0;
+        if (_tempName.isEmpty()) {
+            char path[64];
+            std::snprintf(path, sizeof path, "/proc/self/fd/%d", _fd.get());
+            result = ::linkat(AT_FDCWD, path, AT_FDCWD, _native.constData(), AT_SYMLINK_FOLLOW);
+            if (result != 0 && errno != EEXIST) {
+                const int procError = errno;
+                result = ::linkat(_fd.get(), "", AT_FDCWD, _native.constData(), AT_EMPTY_PATH);
+                if (result != 0 && errno != EEXIST)
+                    errno = procError;
+            }
+        } else {
+            // link() and not rename(): whatever took the name meanwhile stays.
+            result = ::link(_tempName.constData(), _native.constData());
+            if (result == 0) {
+                ::unlink(_tempName.constData());
+                _published = true;
+            }
+        }
+        if (result != 0) {
+            if (errno == EEXIST)
+                appendForeignWorkFile(error, _name);
+            else
+                appendSystemError(error, _name, QFileDevice::WriteError, errno);
+            return false;
+        }
+        _published = true;
+        syncFolder(_name);
+        return true;
+    }
+
+private:
+    QString _name;
+    QByteArray _native;
+    QByteArray _tempName;
+    FileDescriptor _fd;
+    bool _published = false;
+};
+
+// Deals with a work copy left beside \a fileName before a rewrite starts:
+// - the same content as the file: the rewrite had finished; it is removed;
+// - a longer content that the file begins with: the copy back was cut short,
+//   and the work copy is put in place;
+// - the modification time of the file: the rewrite stopped before copying
+//   back; it is finished the same way;
+// - anything else (the file changed since, or the work copy is not one of
+//   ours): both stay as they are and the rewrite is refused with a message.
+bool settleInterruptedRewrite(const QString &fileName, const QString &workName, QString &error)
+{
+    const FileDescriptor target(::open(QFile::encodeName(fileName).constData(), O_RDONLY | O_NONBLOCK | O_CLOEXEC));
+    struct stat targetStatus = {};
+    if (!target.isValid() || ::fstat(target.get(), &targetStatus) != 0) {
+        appendSystemError(error, fileName, QFileDevice::OpenError, errno);
         return false;
-    return handler.regExp().indexIn(text, 0) != -1;
+    }
+    WorkFileTrace trace;
+    inspectWorkFile(workName, targetStatus, trace);
+    switch (trace.kind) {
+    case WorkFileTrace::None:
+        return true;
+    case WorkFileTrace::Foreign:
+        appendForeignWorkFile(error, workName);
+        return false;
+    case WorkFileTrace::Unreadable:
+        appendSystemError(error, workName, QFileDevice::OpenError, trace.errorCode);
+        return false;
+    case WorkFileTrace::Own:
+        break;
+    }
+
+    if (compareContent(target.get(), trace.fd.get(), false)) {
+        if (::unlink(QFile::encodeName(workName).constData()) != 0) {
+            appendSystemError(error, workName, QFileDevice::RemoveError, errno);
+            return false;
+        }
+        return true;
+    }
+    const bool cutShort = compareContent(target.get(), trace.fd.get(), true);
+    if (!cutShort && !sameTime(trace.status.st_mtim, targetStatus.st_mtim)) {
+        appendError(error, QObject::tr("\"%1\" holds a version of \"%2\" from a rewrite that was interrupted, and "
+                                       "\"%2\" has changed since; keep the one you want and remove \"%1\"")
+                               .arg(workName, fileName));
+        return false;
+    }
+    qCWarning(KVT_SYSTEM, "finishing an interrupted rewrite of %s", qPrintable(fileName));
+    if (!RegExpHandler::safeCopy(workName, fileName, error) || !syncFile(fileName, error))
+        return false;
+    if (::unlink(QFile::encodeName(workName).constData()) != 0) {
+        appendSystemError(error, workName, QFileDevice::RemoveError, errno);
+        return false;
+    }
+    syncFolder(workName);
+    return true;
 }
 
 } // namespace
@@ -190,14 +362,21 @@ bool RegExpHandler::readSystemConfigureFile(const QString &fileName, RegExpHandl
         appendFileError(error, file);
         return false;
     }
-    const bool asciiShortcut = localeKeepsAscii();
-    RegExpPrefilter prefilter;
-    LineReader reader(file);
-    const char *data = nullptr;
-    int size = 0;
-    while (reader.next(data, size)) {
-        if (lineMatches(handler, prefilter, data, size, asciiShortcut))
-            handler.handleRegExp(nullptr);
+
+    // A rewrite cut short while copying back leaves the file a beginning of
+    // its work copy, which holds the whole new version: that is read instead.
+    const FileDescriptor probe(::open(QFile::encodeName(fileName).constData(), O_RDONLY | O_NONBLOCK | O_CLOEXEC));
+    struct stat targetStatus = {};
+    WorkFileTrace trace;
+    if (probe.isValid() && ::fstat(probe.get(), &targetStatus) == 0 && S_ISREG(targetStatus.st_mode))
+        inspectWorkFile(QStringLiteral("%1.tmp").arg(fileName), targetStatus, trace);
+    QFile work;
+    if (trace.kind == WorkFileTrace::Own && compareContent(probe.get(), trace.fd.get(), true)
+        && ::lseek(trace.fd.get(), 0, SEEK_SET) == 0 && work.open(trace.fd.get(), QIODevice::ReadOnly)) {
+        qCWarning(KVT_SYSTEM, "%s was cut short by an interrupted rewrite; reading its work copy", qPrintable(fileName));
+        KvtConfigLines::readLines(work, handler);
+    } else {
+        KvtConfigLines::readLines(file, handler);
     }
     file.close();
     return true;
@@ -211,10 +390,12 @@ bool RegExpHandler::rewriteSystemConfigureFile(const QString &fileName, RegExpHa
         return false;
     }
 
-    // The work copy starts as a cp of the file, so it already has the file's
-    // mode and owner; a stale one from an earlier failure is overwritten.
+    // At every moment a whole version of the file is on the disk: the file
+    // itself, or the work copy "<file>.tmp" that is complete before it is
+    // copied back. A work copy left by an interrupted rewrite is dealt with
+    // first, and one that is not a file of our own is never written through.
     const QString workName = QStringLiteral("%1.tmp").arg(fileName);
-    if (!safeCopy(fileName, workName, error))
+    if (!settleInterruptedRewrite(fileName, workName, error))
         return false;
 
     QFile target(fileName);
@@ -222,74 +403,47 @@ bool RegExpHandler::rewriteSystemConfigureFile(const QString &fileName, RegExpHa
         appendFileError(error, target);
         return false;
     }
-    QFile work(workName);
-    if (!work.open(QIODevice::WriteOnly)) {
-        target.close();
-        appendFileError(error, work);
+    struct stat targetStatus = {};
+    if (::fstat(target.handle(), &targetStatus) != 0) {
+        appendSystemError(error, fileName, QFileDevice::OpenError, errno);
         return false;
     }
-
-    // The new content is gathered in memory and written in large blocks.
-    QByteArray out;
-    const auto flush = [&](int threshold) {
-        if (out.size() >= threshold) {
-            work.write(out);
-            out.clear();
-        }
-    };
-    const bool asciiShortcut = localeKeepsAscii();
-    RegExpPrefilter prefilter;
-    LineReader reader(target);
-    const char *data = nullptr;
-    int size = 0;
-    while (reader.next(data, size)) {
-        if (!lineMatches(handler, prefilter, data, size, asciiShortcut)) {
-            out.append(data, size);
-            flush(outputBlockSize);
-            continue;
-        }
-        QByteArray raw(data, size);
-        const bool replaced = handler.handleRegExp(&raw);
-        out.append(raw);
-        if (replaced) {
-            // The handler gave bare content: put the line's comment back and
-            // end the line.
-            // Decoded as a line is everywhere: up to its first NUL byte.
-            const QString decoded = QString::fromLocal8Bit(QByteArray::fromRawData(data, size));
-            const int commentStart = decoded.indexOf(QLatin1Char('#'));
-            if (commentStart >= 0) {
-                const QString comment = decoded.mid(commentStart).trimmed();
-                if (!comment.isEmpty()) {
-                    out.append('\t');
-                    out.append(comment.toLocal8Bit());
-                }
+    WorkFile work(workName);
+    if (!work.create(targetStatus, error))
+        return false;
+    // Every byte is checked: a short write (a full disk, a size limit) is an
+    // error, and a work copy that could not be written completely is never
+    // copied over the file.
+    int writeError = 0;
+    const bool written = KvtConfigLines::rewriteLines(target, handler, [&](const QByteArray &block) {
+        const char *data = block.constData();
+        qint64 left = block.size();
+        while (left > 0) {
+            const ssize_t n = ::write(work.handle(), data, size_t(left));
+            if (n < 0 && errno == EINTR)
+                continue;
+            if (n <= 0) {
+                writeError = n < 0 ? errno : ENOSPC;
+                return false;
             }
-            out.append('\n');
+            data += n;
+            left -= n;
         }
-        flush(outputBlockSize);
+        return true;
+    });
+    if (!written) {
+        appendSystemError(error, workName, QFileDevice::WriteError, writeError);
+        return false;
     }
-
-    QByteArray tail;
-    if (handler.finalHandleRegExp(&tail))
-        out.append(tail);
-    flush(0);
-
-    // A work copy that could not be written completely (a full disk) must
-    // never be copied over the file.
-    const bool readFailed = target.error() != QFileDevice::NoError;
-    work.close();
-    const bool writeFailed = work.error() != QFileDevice::NoError;
+    if (target.error() != QFileDevice::NoError) {
+        appendFileError(error, target); // before close(), which forgets the error
+        return false;
+    }
     target.close();
-    if (writeFailed) {
-        appendFileError(error, work);
-        return false;
-    }
-    if (readFailed) {
-        appendFileError(error, target);
-        return false;
-    }
 
     if (backup) {
+        // Made before the work copy gets its name: when it fails, no complete
+        // work copy is left for the next rewrite to put in place.
         const QString backupName = QStringLiteral("%1.bak").arg(fileName);
         if (QFile::exists(backupName))
             QFile::remove(backupName);
@@ -299,22 +453,33 @@ bool RegExpHandler::rewriteSystemConfigureFile(const QString &fileName, RegExpHa
         }
     }
 
-    if (!safeCopy(workName, fileName, error))
+    if (!work.publish(targetStatus, error))
         return false;
 
-    if (!work.remove()) {
+    // cp rewrites the file in place (inode, mode and owner kept). If it stops
+    // half-way, the work copy stays: it is then the complete version.
+    if (!safeCopy(workName, fileName, error) || !syncFile(fileName, error))
+        return false;
+
+    QFile published(workName);
+    if (!published.remove()) {
         // The file already has its new content; only the clean-up failed.
-        appendFileError(error, work);
+        appendFileError(error, published);
         return false;
     }
+    syncFolder(workName);
     return true;
 }
 
 bool RegExpHandler::safeCopy(const QString &source, const QString &destination, QString &error)
 {
     const QString program = QStringLiteral("cp");
-    const QStringList arguments{QStringLiteral("--force"), QStringLiteral("--preserve=mode,ownership"), source,
-                                destination};
+    // A relative path that begins with "-" would be read by cp as an option.
+    const auto operand = [](const QString &path) {
+        return path.startsWith(QLatin1Char('-')) ? QStringLiteral("./") + path : path;
+    };
+    const QStringList arguments{QStringLiteral("--force"), QStringLiteral("--preserve=mode,ownership"), operand(source),
+                                operand(destination)};
     const QString joined = arguments.join(QLatin1Char(' '));
 
     // No shell: the paths reach cp exactly as given.

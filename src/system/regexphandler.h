@@ -21,8 +21,19 @@
  * backup "<file>.bak", and copies the result back with the system cp, which
  * rewrites the file in place and so keeps its inode, mode and owner. Nothing
  * is thrown: the operations return false and append a message to the
- * caller's error text ("\n" first when the text is not empty). A failure
- * leaves the files as they were at that point; there is no rollback.
+ * caller's error text ("\n" first when the text is not empty).
+ *
+ * A rewrite that is killed, or loses power, at any moment leaves a whole
+ * version on the disk: the work copy is written without a name, synced, and
+ * only then named "<file>.tmp" and copied back; the file is synced before the
+ * work copy goes. The next rewrite finishes an interrupted one (or removes a
+ * work copy whose content the file already has), and refuses with a message
+ * when the file has changed since. A read of a file cut short by an
+ * interrupted copy back reads the complete work copy instead. A work name
+ * taken by anything but a regular file of our own (a link, a device, another
+ * user's file) is never written through: the rewrite is refused. A failure
+ * otherwise leaves the files as they were at that point; there is no
+ * rollback.
  *
  * Two rewrites of the same file at the same time would share the work copy;
  * callers keep them apart.
@@ -64,7 +75,8 @@ public:
     /*!
      * Copies \a source over \a destination with
      * "cp --force --preserve=mode,ownership", waiting up to 30 seconds for the
-     * start and again for the end.
+     * start and again for the end. A relative path that begins with "-" is
+     * given to cp as "./-..." so that it is not taken for an option.
      */
     static bool safeCopy(const QString &source, const QString &destination, QString &error);
 

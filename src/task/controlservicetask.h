@@ -35,8 +35,10 @@ public:
     void setArguments(const QStringList &arguments) { _arguments = arguments; }
 
     /*! Whether the package \a name is installed: dpkg-query lists it with the
-     *  status letters "ii". False when dpkg-query is missing, fails or does
-     *  not answer within 30 seconds. */
+     *  status letters "ii". The name is matched as written ("libstdc++6"),
+     *  except that dpkg-query's wildcards "*", "?" and "[...]" keep their
+     *  meaning. False when dpkg-query is missing, fails or does not answer
+     *  within 30 seconds. */
     static bool existPackage(const QString &name);
 
 protected:

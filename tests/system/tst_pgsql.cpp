@@ -4,8 +4,10 @@
 
 #include "systemtest.h"
 
+#include <QDeadlineTimer>
 #include <QPointer>
 #include <QScopeGuard>
+#include <QThreadPool>
 #include <QtTest>
 
 #include <memory>
@@ -112,8 +114,8 @@ private Q_SLOTS:
                 << "sql" << query << QStringList()
                 << QStringLiteral("SQL request '%1' contains a character that cannot be passed to the shell").arg(query);
         for (const QString &name : {QStringLiteral("bob; drop user postgres"), QStringLiteral("1bob"), QStringLiteral("Bob"),
-                                    QString(64, QLatin1Char('a'))})
-            QTest::newRow(qPrintable(QStringLiteral("refused user '%1'").arg(name.left(20))))
+                                    QStringLiteral("alice\n"), QString(64, QLatin1Char('a'))})
+            QTest::newRow(qPrintable(QStringLiteral("refused user '%1'").arg(name.left(20).replace('\n', "\\n"))))
                 << (name.size() > 20 ? "delete" : "create") << name << QStringList()
                 << QStringLiteral("User name '%1' is not a plain SQL identifier").arg(name);
     }
@@ -206,24 +208,43 @@ private Q_SLOTS:
         QTRY_COMPARE_WITH_TIMEOUT(log, expected, 35000);
     }
 
-    void asynchronousReadDestroyedWhileRunning()
+    void asynchronousReadsOneAtATime()
     {
+        // Each read lists one cluster whose version counts the reads; a
+        // receiver notes whether another read was running while it looked.
         FakePrograms fakes;
-        fakes.add(QStringLiteral("pg_lsclusters"), "sleep 1\necho '11 main 5432 online postgres /a /b'");
-
+        fakes.add(QStringLiteral("pg_lsclusters"),
+                  "dir=$(dirname \"$0\")\nn=$(( $(cat \"$dir/count\" 2>/dev/null || echo 0) + 1 ))\necho $n > \"$dir/count\"\n"
+                  "touch \"$dir/reading\"\nsleep 0.3\nrm \"$dir/reading\"\necho \"$n main 5432 online postgres /a /b\"");
         auto *manager = new PgsqlManagerAsync;
         QStringList log;
-        watch(manager, &log);
+        connect(manager, &PgsqlManagerAsync::clustersReaded, [&](const QList<PgsqlCluster *> &c) {
+            log << describe(c) + (QFile::exists(fakes.filePath(QStringLiteral("reading"))) ? " during a read" : "");
+        });
+
+        // A refresh asked for after a read ended in the pool, but before its
+        // completion reached this thread, waits for that completion.
         manager->startReadClusters();
-        manager->startReadClusters(); // ignored while the first read runs
-        QTRY_COMPARE_WITH_TIMEOUT(log, QStringList{"clustersReaded(11/main:5432)"}, 35000);
-        QTest::qWait(100);
-        QCOMPARE(log.size(), 1);
+        QDeadlineTimer deadline(35000);
+        while (QThreadPool::globalInstance()->activeThreadCount() > 0 && !deadline.hasExpired())
+            QThread::msleep(10);
+        manager->startReadClusters();
+        QTRY_COMPARE_WITH_TIMEOUT(log, (QStringList{"1/main:5432", "2/main:5432"}), 35000);
+
+        // Requests during a read make one more read after it.
+        manager->startReadClusters();
+        manager->startReadClusters();
+        manager->startReadClusters();
+        QTRY_COMPARE_WITH_TIMEOUT(log.size(), 4, 35000);
+        QTest::qWait(500);
+        QCOMPARE(log.mid(2), (QStringList{"3/main:5432", "4/main:5432"}));
 
         manager->startReadClusters();
+        QTRY_VERIFY(QFile::exists(fakes.filePath(QStringLiteral("reading"))));
         delete manager; // waits for the running read instead of leaving it a dead manager
         QCoreApplication::processEvents();
-        QCOMPARE(log.size(), 1);
+        QCOMPARE(log.size(), 4);
+        QCOMPARE(fakes.read(QStringLiteral("count")), QByteArray("5\n"));
     }
 
     void realCluster()

@@ -195,7 +195,12 @@ private Q_SLOTS:
 
         QTest::newRow("removed, configuration left") << QByteArray("printf 'rc foo\\n'") << "foo" << false;
         QTest::newRow("on a later line") << QByteArray("printf 'un bar\\nii foo\\n'") << "foo" << true;
-        QTest::newRow("real database, installed") << QByteArray() << "dpkg" << true;
+        // Names are matched as written; dpkg-query's wildcards keep their meaning.
+        QTest::newRow("regexp characters in the name") << QByteArray("printf 'ii libstdc++6:amd64\\n'") << "libstdc++6" << true;
+        QTest::newRow("a dot is no wildcard") << QByteArray("printf 'ii abc\\n'") << "a.c" << false;
+        QTest::newRow("wildcards") << QByteArray("printf 'un postgresql-9.1\\nii postgresql-15\\n'") << "postgresql-[0-9]?*"
+                                   << true;
+        QTest::newRow("real database, installed") << QByteArray() << "libstdc++6" << true;
         QTest::newRow("real database, unknown") << QByteArray() << "kvt-no-such-package" << false;
     }
     void existPackage()
