@@ -7,7 +7,7 @@ JOBS       ?= $(shell nproc 2>/dev/null || echo 2)
 CMAKE_ARGS ?=
 PREFIX     ?= /usr/local
 
-.PHONY: all deps configure build test demo bench install asan-test clean lupdate
+.PHONY: all deps configure build test demo bench install asan-test clean lupdate docs
 
 all: build
 
@@ -36,6 +36,13 @@ asan-test: deps
 	cmake -S . -B $(ASAN_BUILD) -DCMAKE_BUILD_TYPE=Debug -DKVT_SANITIZE=ON $(CMAKE_ARGS)
 	cmake --build $(ASAN_BUILD) -j $(JOBS)
 	cd $(ASAN_BUILD) && ctest --output-on-failure -j $(JOBS)
+
+# The API reference (HTML and Qt help file) in $(BUILD)/docs/; installed by
+# `make install` once built this way.
+docs:
+	sh scripts/install-deps.sh docs
+	cmake -S . -B $(BUILD) -DKVT_BUILD_DOCS=ON -DCMAKE_INSTALL_PREFIX=$(PREFIX) $(CMAKE_ARGS)
+	cmake --build $(BUILD) --target docs
 
 lupdate: configure
 	cmake --build $(BUILD) --target lupdate
