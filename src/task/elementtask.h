@@ -12,12 +12,19 @@ class Element;
 class KVTCOMMON_EXPORT ElementTask : public AbstractTask
 {
 public:
+    /*!
+     * Creates a task for \a element, owning \a data. Call it in the interface
+     * thread; run() must not use the element (see AbstractTask).
+     */
     ElementTask(Element *element, ElementData *data = nullptr);
+    //! Destroys the task and its record, not the element.
     ~ElementTask() override;
 
+    //! The element the task works for; use it in the constructor and in afterRun() only.
     Element *element() const { return _element; }
 
 protected:
+    //! See element(); not owned.
     Element *_element;
 };
 

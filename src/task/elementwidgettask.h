@@ -12,12 +12,16 @@ class ElementWidget;
 class KVTCOMMON_EXPORT ElementWidgetTask : public AbstractTask
 {
 public:
+    //! Creates a task for \a widget, owning \a data. run() must not use the widget.
     ElementWidgetTask(ElementWidget *widget, ElementData *data = nullptr);
+    //! Destroys the task and its record, not the widget.
     ~ElementWidgetTask() override;
 
+    //! The widget the task works for; use it in afterRun() only.
     ElementWidget *elementWidget() const { return _elementWidget; }
 
 protected:
+    //! See elementWidget(); not owned.
     ElementWidget *_elementWidget;
 };
 

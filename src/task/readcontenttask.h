@@ -13,7 +13,11 @@
 class KVTCOMMON_EXPORT ReadContentTask : public ElementTask
 {
 public:
+    /*!
+     * Creates the task without a record. run() reads the children into the task's own fields; afterRun() creates the child elements from them in the interface thread (see the class description).
+     */
     ReadContentTask(Element *element);
+    //! Destroys the task and its record.
     ~ReadContentTask() override;
 
     void afterRun() override;
