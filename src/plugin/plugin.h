@@ -8,6 +8,10 @@
 #include <QString>
 #include <QtGlobal>
 
+/*! \file plugin.h
+ * The plugin interface: the Plugin base class and its interface id.
+ */
+
 class Plugin;
 
 /*!
