@@ -48,10 +48,10 @@ public:
      */
     Module(const QString &name, QObject *parent = nullptr, bool paranoid = false);
     /*!
-     * Saves the settings, then releases the module data. The elements in
-     * elementNodes() and the widgets are not deleted here: a module that owns
-     * them deletes them in its own destructor, after taking the elements out of
-     * the tree (TreeNode::reset()) while they are still whole.
+     * Saves the settings, deletes the stored element widgets, then releases the
+     * module data. The elements in elementNodes() are not deleted here: a
+     * module that owns them deletes them in its own destructor, after taking
+     * them out of the tree (TreeNode::reset()) while they are still whole.
      */
     ~Module() override;
 
