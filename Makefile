@@ -1,13 +1,18 @@
 # Thin wrapper over CMake. The build folder is build/ (build-asan/ for the
-# sanitizer build).
+# address sanitizer build, build-tsan/ for the thread sanitizer build).
 
 BUILD      ?= build
 ASAN_BUILD ?= build-asan
+TSAN_BUILD ?= build-tsan
+# The tests that run work on threads: tasks, observer, service tasks,
+# processes, PostgreSQL.
+TSAN_TARGETS ?= tst_thread tst_taskobserver tst_elementtasks tst_servicetasks tst_process tst_pgsql
+TSAN_TESTS   ?= ^(tst_thread|tst_taskobserver|tst_elementtasks|tst_servicetasks|tst_process|tst_pgsql)
 JOBS       ?= $(shell nproc 2>/dev/null || echo 2)
 CMAKE_ARGS ?=
 PREFIX     ?= /usr/local
 
-.PHONY: all deps configure build test demo bench install asan-test clean lupdate docs
+.PHONY: all deps configure build test demo bench install asan-test tsan-test clean lupdate docs
 
 all: build
 
@@ -37,6 +42,11 @@ asan-test: deps
 	cmake --build $(ASAN_BUILD) -j $(JOBS)
 	cd $(ASAN_BUILD) && ctest --output-on-failure -j $(JOBS)
 
+tsan-test: deps
+	cmake -S . -B $(TSAN_BUILD) -DCMAKE_BUILD_TYPE=Debug -DKVT_TSAN=ON -DKVT_BUILD_EXAMPLES=OFF $(CMAKE_ARGS)
+	cmake --build $(TSAN_BUILD) -j $(JOBS) --target $(TSAN_TARGETS)
+	cd $(TSAN_BUILD) && ctest --output-on-failure -j $(JOBS) -R '$(TSAN_TESTS)'
+
 # The API reference (HTML and Qt help file) in $(BUILD)/docs/; installed by
 # `make install` once built this way.
 docs:
@@ -48,4 +58,4 @@ lupdate: configure
 	cmake --build $(BUILD) --target lupdate
 
 clean:
-	rm -rf $(BUILD) $(ASAN_BUILD)
+	rm -rf $(BUILD) $(ASAN_BUILD) $(TSAN_BUILD)

@@ -28,6 +28,13 @@ if(KVT_SANITIZE)
     add_link_options(-fsanitize=address,undefined -fno-sanitize-recover=all)
 endif()
 
+# ThreadSanitizer: the library and its tests are instrumented, Qt is not;
+# tests/tsan.supp explains what that costs.
+if(KVT_TSAN)
+    add_compile_options(-fsanitize=thread -fno-omit-frame-pointer)
+    add_link_options(-fsanitize=thread)
+endif()
+
 # Where translations live once installed, and where the build tree keeps them.
 set(KVT_TRANSLATIONS_INSTALL_DIR "${CMAKE_INSTALL_DATADIR}/brel/translations")
 set(KVT_TRANSLATIONS_BUILD_DIR "${PROJECT_BINARY_DIR}/translations")

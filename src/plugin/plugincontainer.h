@@ -49,15 +49,16 @@ public:
     /*!
      * Unloads what is loaded and loads every plugin below \a directory.
      * Pending interface events are processed between files and between
-     * modules, so the window stays responsive; do not start another load
-     * from an event handler while one runs.
+     * modules, so the window stays responsive. A load or unload asked for by
+     * such an event waits: it runs when the current load has ended (of
+     * several, the last one asked for), and a warning is logged.
      *
      * A missing directory is reported in a message box and leaves the
      * container empty.
      */
     void loadPlugins(const QString &directory);
     /*! Detaches and destroys every plugin and module; the tree is empty
-     *  afterwards. */
+     *  afterwards. Asked for during a load, it waits until the load ends. */
     void unloadPlugins();
 
     /*! The union of the operation classes of the plugins that contributed
@@ -104,7 +105,9 @@ protected:
     PluginDialog *_pluginDialog;
 
 private:
-    void loadPlugin(const QString &filePath);
+    void loadDirectory(const QString &directory);
+    bool loadPlugin(const QString &filePath);
+    void unloadWhileLoading();
 };
 
 #endif // KVT_PLUGINCONTAINER_H

@@ -49,6 +49,10 @@ public:
      * The observer of the process, created by the first call with \a parent
      * as its QObject parent (and, when it is a widget, as the parent of the
      * dialogs); later calls ignore \a parent.
+     *
+     * The observer and its dialogs belong to the interface thread: called
+     * from another thread while no observer exists, this returns null and
+     * logs a warning instead of creating one there.
      */
     static TaskObserver *instance(QObject *parent = nullptr);
 
@@ -109,10 +113,17 @@ private:
 
     void openBlockDialog();
     void closeBlockDialog();
-    void recordOutcome(AbstractTask *task);
+    void recordOutcome(AbstractTask *task, const TaskDescription &outcome);
     void forgetTask(AbstractTask *task);
     bool requestStop(int row);
+    quint64 rowTaskSpecialFlags(int row) const;
+    void settleDroppedTasks();
 
+    // Called by AbstractTask, from any thread.
+    static void postCompletion(AbstractTask *task);
+    static void taskDestroyed(AbstractTask *task);
+
+    friend class AbstractTask;
     friend class TaskObserverModel;
 
     int _runningCount;
