@@ -29,9 +29,8 @@ class ElementData;
  * - TaskDescription::Warning: a problem like a failure for the task dialog,
  *   while afterRun() treats it as a success.
  * A task that ends still TaskDescription::Processing (the default) or
- * TaskDescription::AboutToBeStopped is never counted as finished: its
- * afterRun() runs and it is deleted, but the task dialog keeps its close
- * button blocked until the list is cleared.
+ * TaskDescription::AboutToBeStopped is a programming error: the observer logs
+ * it (category kvt.task) and lists the task as a warning.
  *
  * \section task_threads Threads
  * run() runs in a worker thread and may touch only the task's own fields and

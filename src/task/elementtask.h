@@ -8,6 +8,11 @@ class Element;
 /*!
  * A task that works for one element. The element is not owned; it must
  * outlive the task (the observer deletes the task, never the element).
+ *
+ * The task keeps a plain pointer: an element deleted while its task is
+ * queued or running is not noticed, and afterRun() would then reach freed
+ * memory. Delete elements, and unload the plugins that own them, only while
+ * no task works for them (TaskObserver::runningCount() is 0).
  */
 class KVTCOMMON_EXPORT ElementTask : public AbstractTask
 {

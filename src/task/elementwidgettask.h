@@ -7,7 +7,8 @@ class ElementWidget;
 
 /*!
  * A task that works for one element widget (import, export, print). The
- * widget is not owned; it must outlive the task.
+ * widget is not owned; it must outlive the task, which keeps a plain pointer
+ * and would reach freed memory in afterRun() if the widget went first.
  */
 class KVTCOMMON_EXPORT ElementWidgetTask : public AbstractTask
 {
