@@ -15,7 +15,7 @@ JOBS       ?= $(shell nproc 2>/dev/null || echo 2)
 CMAKE_ARGS ?=
 PREFIX     ?= /usr/local
 
-.PHONY: all deps configure build test demo bench install asan-test tsan-test fuzz fuzz-run clean lupdate
+.PHONY: all deps configure build test demo bench install asan-test tsan-test fuzz fuzz-run clean lupdate docs
 
 all: build
 
@@ -58,6 +58,13 @@ fuzz: deps
 # Each fuzz target for FUZZ_SECONDS, from the seed corpus in fuzz/corpus/.
 fuzz-run: fuzz
 	sh fuzz/run.sh $(FUZZ_BUILD) $(FUZZ_SECONDS)
+
+# The API reference (HTML and Qt help file) in $(BUILD)/docs/; installed by
+# `make install` once built this way.
+docs:
+	sh scripts/install-deps.sh docs
+	cmake -S . -B $(BUILD) -DKVT_BUILD_DOCS=ON -DCMAKE_INSTALL_PREFIX=$(PREFIX) $(CMAKE_ARGS)
+	cmake --build $(BUILD) --target docs
 
 lupdate: configure
 	cmake --build $(BUILD) --target lupdate

@@ -3,6 +3,9 @@
 # demo of libkvt-common. Only missing packages are installed, and the package
 # lists are refreshed only when something is missing. Works as root or
 # through sudo.
+#
+# Usage: install-deps.sh [docs]
+#   docs   also the tools of the API reference (Doxygen, qhelpgenerator)
 set -eu
 
 packages="
@@ -26,6 +29,18 @@ postgresql-client
 clang
 libclang-rt-dev
 "
+
+# The API reference is built only on request (make docs, CI).
+docs_packages="
+doxygen
+qhelpgenerator-qt5
+"
+for arg in "$@"; do
+    case "$arg" in
+        docs) packages="$packages $docs_packages" ;;
+        *) echo "install-deps: unknown argument '$arg' (expected: docs)" >&2; exit 2 ;;
+    esac
+done
 
 missing=""
 for p in $packages; do

@@ -38,7 +38,12 @@ public:
     //! A file tried: its loader (owned) and the accepted plugin, or null.
     typedef QPair<QPluginLoader *, Plugin *> PluginEntry;
 
+    /*!
+     * Creates an empty container. When \a parent is a widget it becomes the parent
+     * of the container's message boxes and of the plugin dialog.
+     */
     explicit PluginContainer(QObject *parent = nullptr);
+    //! Unloads every plugin (see unloadPlugins()).
     ~PluginContainer() override;
 
     /*!
@@ -59,8 +64,11 @@ public:
     /*! The union of the operation classes of the plugins that contributed
      *  at least one module. */
     quint64 availableOperationsClass() const { return _availableOperationsClass; }
+    //! The directory last given to loadPlugins(); empty after unloading.
     QString pluginPath() const { return _pluginPath; }
+    //! Every accepted module, in load order.
     QList<TreeNode *> modules() const { return _modules; }
+    //! The model of every file tried and of the modules of each plugin; owned by the container.
     PluginModel *pluginModel() const { return _pluginModel; }
 
     /*! Every file tried by the last load, in the order tried. */
@@ -71,19 +79,29 @@ public:
     QString pluginError(int index) const;
 
 public Q_SLOTS:
+    //! Shows the plugin dialog (window-modal).
     void showPluginDialog() const;
 
 Q_SIGNALS:
+    //! Relays Module::contentElementWidgetChanged() of every loaded module.
     void contentElementWidgetChanged(int state);
+    //! Relays Module::customContextMenuRequested() of every loaded module.
     void customContextMenuRequested(const QPoint &pos);
 
 protected:
+    //! See availableOperationsClass().
     quint64 _availableOperationsClass;
+    //! The constructor's parent when it is a widget, else null.
     QWidget *_parentWidget;
+    //! See pluginPath().
     QString _pluginPath;
+    //! See plugins().
     QList<PluginEntry> _plugins;
+    //! See modules().
     QList<TreeNode *> _modules;
+    //! See pluginModel().
     PluginModel *_pluginModel;
+    //! The plugin dialog, parented to the parent widget (deleted by the container without one).
     PluginDialog *_pluginDialog;
 
 private:

@@ -27,9 +27,15 @@ class KVTCOMMON_EXPORT Thread : public QThread
     Q_OBJECT
 
 public:
+    //! Number of slots in the ring shared by all workers.
     static const int BufferSize = 64;
 
+    //! Creates a worker; it takes tasks once start()ed.
     explicit Thread(QObject *parent = nullptr);
+    /*!
+     * Stops every worker (not only this one) and waits for this thread to end.
+     * Tasks still queued are deleted without running and never reach afterRun().
+     */
     ~Thread() override;
 
     /*!
@@ -40,10 +46,15 @@ public:
      */
     static bool put(AbstractTask *task);
 
-    //! The worker's place among the started workers; -1 until it starts.
+    /*!
+     * The order in which this worker started (0 for the first), or -1 until its
+     * run() has begun. The ring accepts tasks once the first worker reached that
+     * point: wait until threadIndex() is not -1 before the first performTask().
+     */
     int threadIndex() const { return _threadIndex.load(std::memory_order_acquire); }
 
 protected:
+    //! The worker loop: takes tasks from the ring and runs them until the workers stop.
     void run() override;
 
 private:
