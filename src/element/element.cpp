@@ -1,6 +1,7 @@
 #include "element.h"
 
 #include "elementdata.h"
+#include "elementtask_p.h"
 #include "elementtreeops_p.h"
 #include "elementwidget_p.h"
 #include "module.h"
@@ -37,6 +38,8 @@ Element::~Element()
     dyingElements.remove(this);
     // Widgets keep a plain pointer to their element: they let go of it now.
     KvtElementWidgets::elementDestroyed(this);
+    // So do the tasks still queued or running for it: their afterRun() finds null.
+    ElementTaskPrivate::elementDestroyed(this);
     delete _elementData;
     _elementData = nullptr;
 }

@@ -5,6 +5,9 @@
 
 class AbstractTask;
 class Element;
+class ElementTask;
+class ElementWidget;
+class ElementWidgetTask;
 
 namespace ElementTaskPrivate {
 
@@ -13,6 +16,17 @@ namespace ElementTaskPrivate {
 QVariant forceReread(const Element *element);
 
 bool failed(const AbstractTask *task);
+
+// Element and element widget tasks keep a plain pointer to their element or
+// widget. The tasks that exist are listed here, so that an element or widget
+// destroyed before its task has ended clears that pointer: afterRun() then
+// finds null instead of freed memory.
+void addTask(ElementTask *task);
+void removeTask(ElementTask *task);
+void addTask(ElementWidgetTask *task);
+void removeTask(ElementWidgetTask *task);
+void elementDestroyed(const Element *element);
+void widgetDestroyed(const ElementWidget *widget);
 
 }
 

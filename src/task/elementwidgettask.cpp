@@ -1,9 +1,15 @@
 #include "elementwidgettask.h"
 
+#include "elementtask_p.h"
+
 ElementWidgetTask::ElementWidgetTask(ElementWidget *widget, ElementData *data)
     : AbstractTask(data)
     , _elementWidget(widget)
 {
+    ElementTaskPrivate::addTask(this);
 }
 
-ElementWidgetTask::~ElementWidgetTask() = default;
+ElementWidgetTask::~ElementWidgetTask()
+{
+    ElementTaskPrivate::removeTask(this);
+}

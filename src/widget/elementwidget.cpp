@@ -1,5 +1,6 @@
 #include "elementwidget.h"
 
+#include "elementtask_p.h"
 #include "elementwidget_p.h"
 
 #include "element.h"
@@ -54,6 +55,8 @@ ElementWidget::ElementWidget(Module &module, RightsPredicate check, QWidget *par
 ElementWidget::~ElementWidget()
 {
     liveWidgets().remove(this);
+    // Tasks still queued or running for this widget let go of it.
+    ElementTaskPrivate::widgetDestroyed(this);
 }
 
 quint64 ElementWidget::availableOperations() const

@@ -246,6 +246,29 @@ private Q_SLOTS:
         QTEST(actual.join(QLatin1String(" | ")), "expected");
     }
 
+    // The element goes while its update task runs (a reload, an unloaded
+    // plugin): the task's afterRun() finds no element instead of freed memory.
+    void taskOutlivesItsElement()
+    {
+        QSemaphore started, release;
+        bool sawNull = false;
+        auto *task = new Probe<UserTask<UpdateTask>>(&outcomes, alice, new ElementData);
+        task->work = [&](auto *) {
+            started.release();
+            return release.tryAcquire(1, 10000);
+        };
+        task->after = [&](auto *t) { sawNull = t->element() == nullptr; };
+        TaskObserver::instance()->performTask(task);
+        QVERIFY(started.tryAcquire(1, 10000));
+        users->removeOne(alice);
+        delete alice;
+        alice = nullptr;
+        release.release();
+        settle();
+        QCOMPARE(outcomes, QStringList{QStringLiteral("success")});
+        QVERIFY(sawNull);
+    }
+
     void printThroughStylesheet()
     {
         const QString xml = QStringLiteral("<users><user>alice</user><user>b&amp;b</user></users>");
