@@ -285,6 +285,11 @@ void MainWindow::pluginsReset()
 {
     _elements->pluginContainerReset(_plugins->rootNode());
     _moduleView->expandAll();
+    // The first module is chosen, so its elements are on show at once.
+    const QModelIndex first = _plugins->treeNodeModel()->index(0, 0);
+    if (first.isValid())
+        _moduleView->selectionModel()->setCurrentIndex(first, QItemSelectionModel::ClearAndSelect
+                                                                  | QItemSelectionModel::Rows);
     updateActions();
 }
 
@@ -656,7 +661,8 @@ void MainWindow::loadSettings()
     QSettings settings;
     restoreGeometry(settings.value(QLatin1String(geometryKey)).toByteArray());
     restoreState(settings.value(QLatin1String(stateKey)).toByteArray());
-    _splitter->restoreState(settings.value(QLatin1String(splitterKey)).toByteArray());
+    if (!_splitter->restoreState(settings.value(QLatin1String(splitterKey)).toByteArray()))
+        _splitter->setSizes({260, 320, 520});
 }
 
 void MainWindow::saveSettings() const
