@@ -611,11 +611,15 @@ bool MainWindow::tasksIdle()
 bool MainWindow::waitForTasks(int timeoutMs)
 {
     QDeadlineTimer deadline(timeoutMs);
+    // Sleeps until an event comes (a task's completion, or the timer at the
+    // deadline) rather than polling: the workers get the processor.
+    QTimer wake;
+    wake.setSingleShot(true);
+    wake.start(timeoutMs);
     while (!tasksIdle()) {
         if (deadline.hasExpired())
             return false;
-        QCoreApplication::processEvents(QEventLoop::AllEvents, 20);
-        QCoreApplication::sendPostedEvents();
+        QCoreApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents);
     }
     QCoreApplication::processEvents();
     return true;
