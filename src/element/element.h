@@ -72,7 +72,11 @@ public:
     // part of the binary interface that plugins are built against.
     /*!
      * The widget that shows this element in \a role: the module's widget for the
-     * element type, or null. A persistent element has no creation widget.
+     * element type, or null. A persistent element has no creation widget. The
+     * widget container shows a create-role widget without an element; a
+     * container element under which new elements are created overrides this to
+     * tell its widget where they go (CreateTask's afterRun() asks the container
+     * for its create-role widget too).
      */
     virtual ElementWidget *elementWidget(ElementWidgetRole role);
     //! The index of the current way of showing the children (see displayChildrenVariants()).

@@ -90,7 +90,10 @@ public:
      * for the ReadContentOperation that CreateTask performs after a creation in
      * force reread mode, \a data is a new record that is handed over with the
      * call: the module owns it from then on and gives it to the task it starts
-     * (which deletes it) or deletes it itself. The library passes null for
+     * (which deletes it) or deletes it itself. A create-role ViewEditElementWidget
+     * sends its exportElementData() with CreateOperation, with the widget as
+     * \a context and no element (the widget is shown with
+     * setElement(nullptr, CreateElementRole)). The library passes null for
      * InsertedOperation, RemovedOperation, ResetOperation, ReadPropertyOperation,
      * DeleteOperation and the content reads of an expansion. A record that comes
      * with any other operation (ChangeDisplayOperation, plugin operations) belongs
