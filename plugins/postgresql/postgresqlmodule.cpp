@@ -290,6 +290,15 @@ void ClusterElement::setInfo(const Pgsql::ClusterInfo &info)
     emitNodeDataChanged();
 }
 
+ElementWidget *ClusterElement::elementWidget(ElementWidgetRole role)
+{
+    auto &module = static_cast<PostgresqlModule &>(_module);
+    if (role != CreateElementRole)
+        return ContainerElement::elementWidget(role);
+    module.setCreateTarget(this);
+    return module.elementWidget(Pgsql::newUserType);
+}
+
 quint64 ClusterElement::availableOperations() const
 {
     // Users can be read and created only while the cluster runs.
@@ -366,17 +375,11 @@ PostgresqlModule::PostgresqlModule(QObject *parent)
     _startAction = new QAction(QIcon::fromTheme(QStringLiteral("media-playback-start")), tr("Start cluster"), this);
     _startAction->setObjectName(QStringLiteral("pgsqlStartClusterAction"));
     connect(_startAction, SIGNAL(triggered()), this, SLOT(startCurrentCluster()));
-    _createUserAction = new QAction(QIcon::fromTheme(QStringLiteral("list-add")), tr("Create user..."), this);
-    _createUserAction->setObjectName(QStringLiteral("pgsqlCreateUserAction"));
-    connect(_createUserAction, SIGNAL(triggered()), this, SLOT(askCreateUser()));
-    _dropUserAction = new QAction(QIcon::fromTheme(QStringLiteral("list-remove")), tr("Drop user..."), this);
-    _dropUserAction->setObjectName(QStringLiteral("pgsqlDropUserAction"));
-    connect(_dropUserAction, SIGNAL(triggered()), this, SLOT(askDropUser()));
-    _elementActionsMap.insert(Pgsql::clusterType, {_startAction, _createUserAction});
-    _elementActionsMap.insert(Pgsql::userType, {_dropUserAction});
+    _elementActionsMap.insert(Pgsql::clusterType, {_startAction});
 
     insertElementWidget(new ClusterWidget(*this));
     insertElementWidget(new PgUserWidget(*this));
+    insertElementWidget(new PgUserCreateWidget(*this));
     connectElementWidgets();
 }
 
@@ -506,8 +509,19 @@ void PostgresqlModule::performOperation(ContextOperation *context, OperationType
                                         int flags)
 {
     Module::performOperation(context, type, data, flags);
-    Element *element = context ? context->elementContext() : nullptr;
-    if (!element || &element->module() != this)
+    if (!context || &context->module() != this)
+        return;
+    if (context->elementWidgetContext()) {
+        // The creation widget applies: a new user in the cluster it was
+        // shown for. The exported record is taken over.
+        if (type == CreateOperation && _createTarget && _createTarget->isEditable())
+            createUser(_createTarget, data);
+        else
+            delete data;
+        return;
+    }
+    Element *element = context->elementContext();
+    if (!element)
         return;
 
     if (element == _group) {
@@ -541,6 +555,8 @@ void PostgresqlModule::performOperation(ContextOperation *context, OperationType
 
 void PostgresqlModule::createUser(ClusterElement *cluster, ElementData *data)
 {
+    // A record given is the caller's new one, taken over here.
+    std::unique_ptr<ElementData> given(data);
     QString name = data ? data->name() : QString();
     QString password = data ? data->value(passwordKey).toString() : QString();
     if (name.isEmpty()) {
@@ -560,26 +576,6 @@ void PostgresqlModule::createUser(ClusterElement *cluster, ElementData *data)
     record->setName(name);
     record->insert(passwordKey, password);
     TaskObserver::instance()->performTask(new CreateUserTask(cluster, record, this));
-}
-
-void PostgresqlModule::askCreateUser()
-{
-    if (ClusterElement *cluster = currentCluster())
-        cluster->performOperation(CreateOperation, nullptr, 0);
-}
-
-void PostgresqlModule::askDropUser()
-{
-    auto *user = qobject_cast<PgUserElement *>(_current.data());
-    if (!user || !(user->availableOperations() & DeleteOperation))
-        return;
-    QPointer<PgUserElement> guard(user);
-    if (QMessageBox::question(qobject_cast<QWidget *>(QApplication::activeWindow()), tr("Drop user"),
-                              user->questionForRemove(), QMessageBox::Yes | QMessageBox::No, QMessageBox::No)
-        != QMessageBox::Yes)
-        return;
-    if (guard)
-        guard->performOperation(DeleteOperation, nullptr, 0);
 }
 
 void PostgresqlModule::startCurrentCluster()

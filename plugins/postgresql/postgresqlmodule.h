@@ -20,6 +20,8 @@ namespace Pgsql {
 const QString groupType = QStringLiteral("pgsqlClusters");
 const QString clusterType = QStringLiteral("pgsqlCluster");
 const QString userType = QStringLiteral("pgsqlUser");
+//! The type of the widget that creates a user (a cluster's creation widget).
+const QString newUserType = QStringLiteral("pgsqlNewUser");
 
 //! Starting a stopped cluster, in a bit the library leaves to plugins.
 const quint64 StartClusterOperation = 0x1000;
@@ -70,6 +72,9 @@ public:
     ClusterElement(Module &module, const Pgsql::ClusterInfo &info);
     const Pgsql::ClusterInfo &info() const { return _info; }
     void setInfo(const Pgsql::ClusterInfo &info);
+    /*! For the creation role, the widget that creates a database user in
+     *  this cluster; otherwise the cluster's own widget. */
+    ElementWidget *elementWidget(ElementWidgetRole role) override;
     quint64 availableOperations() const override;
     void performOperation(OperationType type, ElementData *data, int flags) override;
     QString toolTipText() const override;
@@ -124,13 +129,14 @@ Q_SIGNALS:
 private Q_SLOTS:
     void clustersReaded(const QList<PgsqlCluster *> &clusters);
     void exceptionArise(const AppException &exception);
-    void askCreateUser();
-    void askDropUser();
     void startCurrentCluster();
 
 private:
     void createUser(ClusterElement *cluster, ElementData *data);
     ClusterElement *currentCluster() const;
+    /*! The cluster whose creation widget was asked for last: creation
+     *  widgets are shown without an element. */
+    void setCreateTarget(ClusterElement *cluster) { _createTarget = cluster; }
 
     ClustersGroupElement *_group;
     PgsqlManagerAsync *_manager;
@@ -138,11 +144,12 @@ private:
     QString _lastError;
     QString _pendingError;
     QAction *_startAction;
-    QAction *_createUserAction;
-    QAction *_dropUserAction;
 
+    friend class ClusterElement;
     friend class PgsqlInfoWidget;
+    friend class PgUserCreateWidget;
     QPointer<Element> _current;
+    QPointer<ClusterElement> _createTarget;
 };
 
 #endif // KVT_ADMIN_POSTGRESQLMODULE_H

@@ -8,7 +8,11 @@
 
 #include <kvt-common/elementdata.h>
 
+#include <kvt-common/passworddialog.h>
+
 #include <QAction>
+#include <QPushButton>
+#include <QTimer>
 #include <QFormLayout>
 #include <QHBoxLayout>
 #include <QLabel>
@@ -129,4 +133,81 @@ PgUserWidget::PgUserWidget(PostgresqlModule &module, QWidget *parent)
 {
     setObjectName(QStringLiteral("PgUserWidget"));
     setWindowTitle(tr("Database user"));
+}
+
+PgUserCreateWidget::PgUserCreateWidget(PostgresqlModule &module, QWidget *parent)
+    : ViewEditElementWidget(module, KvtAdmin::mayChangeSystem, parent)
+    , _pgsqlModule(module)
+{
+    _elementType = Pgsql::newUserType;
+    setObjectName(QStringLiteral("PgUserCreateWidget"));
+    setWindowTitle(tr("New database user"));
+    auto *layout = new QVBoxLayout(this);
+    auto *form = new QFormLayout;
+    _clusterLabel = new QLabel(this);
+    _clusterLabel->setObjectName(QStringLiteral("_clusterLabel"));
+    _userLabel = new QLabel(this);
+    _userLabel->setObjectName(QStringLiteral("_userLabel"));
+    form->addRow(tr("Cluster:"), _clusterLabel);
+    form->addRow(tr("User:"), _userLabel);
+    layout->addLayout(form);
+    auto *button = new QPushButton(tr("Name and password..."), this);
+    button->setObjectName(QStringLiteral("_credentialsPushButton"));
+    connect(button, SIGNAL(clicked()), this, SLOT(askCredentials()));
+    auto *buttons = new QHBoxLayout;
+    buttons->addWidget(button);
+    buttons->addStretch(1);
+    layout->addLayout(buttons);
+    layout->addStretch(1);
+}
+
+void PgUserCreateWidget::beforeCreation()
+{
+    _user.clear();
+    _password.clear();
+    _userLabel->clear();
+    _clusterLabel->setText(_pgsqlModule._createTarget ? _pgsqlModule._createTarget->title() : QString());
+    // After the widget is on display, not inside the container's switch.
+    QTimer::singleShot(0, this, SLOT(askCredentials()));
+}
+
+void PgUserCreateWidget::askCredentials()
+{
+    if (_role != CreateElementRole || !isVisible())
+        return;
+    PasswordDialog dialog(this);
+    dialog.setWindowTitle(tr("New user of cluster %1").arg(_clusterLabel->text()));
+    dialog.setUser(_user);
+    dialog.checkValid();
+    if (dialog.exec() != QDialog::Accepted)
+        return;
+    _user = dialog.user();
+    _password = dialog.password();
+    _userLabel->setText(_user);
+    changeContent();
+}
+
+ElementData *PgUserCreateWidget::exportElementData() const
+{
+    auto *data = new ElementData;
+    data->setName(_user);
+    data->insert(QStringLiteral("password"), _password);
+    return data;
+}
+
+bool PgUserCreateWidget::isContentValid() const
+{
+    // The name itself is checked by the library when the user is created,
+    // and its refusal reaches the task list.
+    return !_user.isEmpty();
+}
+
+QString PgUserCreateWidget::toolTipText() const
+{
+    return windowTitle();
+}
+
+QString PgUserCreateWidget::caption() const
+{
+    return tr("New user of cluster %1").arg(_clusterLabel->text());
 }

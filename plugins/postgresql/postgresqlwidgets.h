@@ -56,4 +56,36 @@ public:
     explicit PgUserWidget(PostgresqlModule &module, QWidget *parent = nullptr);
 };
 
+/*!
+ * Creates a database user in the cluster it is shown for. Name and password
+ * are asked with the library's credential dialog, which opens as soon as
+ * the widget is shown for creating; applying starts the task.
+ */
+class PgUserCreateWidget : public ViewEditElementWidget
+{
+    Q_OBJECT
+
+public:
+    explicit PgUserCreateWidget(PostgresqlModule &module, QWidget *parent = nullptr);
+
+    void beforeCreation() override;
+    ElementData *exportElementData() const override;
+    bool isContentValid() const override;
+    QString toolTipText() const override;
+    QString caption() const override;
+
+    QString userName() const { return _user; }
+
+public Q_SLOTS:
+    /*! Asks for the name and password of the new user. */
+    void askCredentials();
+
+private:
+    PostgresqlModule &_pgsqlModule;
+    QLabel *_clusterLabel;
+    QLabel *_userLabel;
+    QString _user;
+    QString _password;
+};
+
 #endif // KVT_ADMIN_POSTGRESQLWIDGETS_H

@@ -8,6 +8,7 @@
 
 #include <kvt-common/servicelightelementdata.h>
 
+#include <QAction>
 #include <QFontDatabase>
 #include <QGridLayout>
 #include <QHBoxLayout>
