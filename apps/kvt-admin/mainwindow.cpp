@@ -35,6 +35,7 @@
 #include <QSplitter>
 #include <QStatusBar>
 #include <QTemporaryDir>
+#include <QTimer>
 #include <QToolBar>
 #include <QTreeView>
 #include <QVBoxLayout>
@@ -326,8 +327,18 @@ void MainWindow::moduleSelectionChanged()
 
 void MainWindow::elementSelectionChanged()
 {
-    if (_restoring)
+    if (_restoring || _selectionPending)
         return;
+    // Settled once the input event that changed the selection is over: a
+    // question asked in the middle of a mouse click would see the rest of
+    // the click change the selection again.
+    _selectionPending = true;
+    QTimer::singleShot(0, this, SLOT(settleElementSelection()));
+}
+
+void MainWindow::settleElementSelection()
+{
+    _selectionPending = false;
     Element *element = currentElement();
     if (element && element == _shownElement && _widgetContainer->currentElementWidget()) {
         updateActions();

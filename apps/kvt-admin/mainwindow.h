@@ -91,6 +91,7 @@ protected:
 private Q_SLOTS:
     void moduleSelectionChanged();
     void elementSelectionChanged();
+    void settleElementSelection();
     void selectNode(TreeNode *node);
     void expandNode(TreeNode *node);
     void createElement();
@@ -139,6 +140,7 @@ private:
     QPointer<Element> _shownElement;
     QPointer<Module> _shownModule;
     bool _restoring = false;
+    bool _selectionPending = false;
     QStringList _missingDirectories;
     std::unique_ptr<QTemporaryDir> _mergedDirectory;
 };
