@@ -89,9 +89,6 @@ public:
     ServiceItemElement *currentService() const { return _current; }
     void setCurrentService(ServiceItemElement *service);
     QAction *action(Services::ServiceOperation operation) const;
-    /*! Enables the element actions for the current service's state and the
-     *  rights. */
-    void updateActions();
 
     /*! Replaces the services under the group (interface thread). */
     void setServices(const QStringList &names);
@@ -99,6 +96,11 @@ public:
     void statusReadFinished();
     /*! Status reads queued or running. */
     int pendingStatusReads() const { return _statusQueue.size() + _statusInFlight; }
+
+public Q_SLOTS:
+    /*! Enables the element actions for the current service's state and the
+     *  rights. */
+    void updateActions();
 
 private Q_SLOTS:
     void triggerAction();
