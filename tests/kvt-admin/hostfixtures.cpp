@@ -9,6 +9,7 @@
 #include <kvt-common/elementtreeview.h>
 #include <kvt-common/taskobserver.h>
 #include <kvt-common/taskobserverdialog.h>
+#include <kvt-common/vieweditelementwidget.h>
 
 #include <QDir>
 #include <QFile>
@@ -28,6 +29,9 @@ bool closeWindow(std::unique_ptr<MainWindow> &window)
     if (TaskObserverDialog *dialog = TaskObserver::instance()->dialog())
         dialog->reject();
     bool idle = AdminTest::waitIdle();
+    // Whatever a failed check left unapplied is discarded, not asked about.
+    if (ViewEditElementWidget *widget = window->shownEditWidget())
+        widget->setUnchanged();
     window->elementView()->clearSelection();
     window->elementView()->setCurrentIndex(QModelIndex());
     idle = AdminTest::waitIdle() && idle;

@@ -59,6 +59,7 @@ class TestServices : public QObject
 
 private Q_SLOTS:
     void initTestCase();
+    void cleanup();
     void cleanupTestCase();
 
     void parseUnitFiles_data();
@@ -71,6 +72,8 @@ private Q_SLOTS:
 
 private:
     std::unique_ptr<WorkerThreads> _workers;
+    // Closed by cleanup(), also after a failed check.
+    std::unique_ptr<MainWindow> _window;
 };
 
 void TestServices::initTestCase()
@@ -78,6 +81,12 @@ void TestServices::initTestCase()
     QCoreApplication::setOrganizationName(QStringLiteral("kvt-admin"));
     QCoreApplication::setApplicationName(QStringLiteral("kvt-admin"));
     _workers = std::make_unique<WorkerThreads>(2);
+}
+
+void TestServices::cleanup()
+{
+    QVERIFY(HostFixtures::closeWindow(_window));
+    qApp->setProperty("kvtAdminAllowChanges", QVariant());
 }
 
 void TestServices::cleanupTestCase()
@@ -176,44 +185,42 @@ void TestServices::startAndStopRealService()
 
     qApp->setProperty("kvtAdminAllowChanges", true);
     DialogAnswerer answerer;
-    std::unique_ptr<MainWindow> window = openMainWindow();
-    QAbstractItemModelTester tester(window->elementView()->model(),
+    _window = openMainWindow();
+    QAbstractItemModelTester tester(_window->elementView()->model(),
                                     QAbstractItemModelTester::FailureReportingMode::QtTest);
-    QVERIFY(chooseModule(*window, QStringLiteral("services")));
+    QVERIFY(chooseModule(*_window, QStringLiteral("services")));
 
     // The machine's own services are listed beside the test's.
-    QVERIFY(chooseElement(*window, {QStringLiteral("Services"), QStringLiteral("postgresql")}));
-    Element *service = chooseElement(*window, {QStringLiteral("Services"), name});
+    QVERIFY(chooseElement(*_window, {QStringLiteral("Services"), QStringLiteral("postgresql")}));
+    Element *service = chooseElement(*_window, {QStringLiteral("Services"), name});
     QVERIFY(service);
     QTRY_COMPARE_WITH_TIMEOUT(shownState(service), QStringLiteral("stopped"), 20000);
 
     // The widget shows the status command's own output.
-    auto *status = window->widgetContainer()->findChild<QPlainTextEdit *>(QStringLiteral("_statusPlainTextEdit"));
+    auto *status = _window->widgetContainer()->findChild<QPlainTextEdit *>(QStringLiteral("_statusPlainTextEdit"));
     QVERIFY(status);
     QTRY_VERIFY(status->toPlainText().contains(QStringLiteral("no server running")));
-    auto *state = window->widgetContainer()->findChild<QLabel *>(QStringLiteral("_stateLabel"));
+    auto *state = _window->widgetContainer()->findChild<QLabel *>(QStringLiteral("_stateLabel"));
     QCOMPARE(state->text(), QStringLiteral("stopped"));
-    screenshot(window.get(), QStringLiteral("kvt-admin-service"));
+    screenshot(_window.get(), QStringLiteral("kvt-admin-service"));
 
     // Start: the icon and the open widget follow, and the cluster runs.
-    QVERIFY(clickButton(*window, "_serviceStartActionToolButton"));
+    QVERIFY(clickButton(*_window, "_serviceStartActionToolButton"));
     QVERIFY(waitIdle(60000));
     QCOMPARE(shownState(service), QStringLiteral("running"));
     QCOMPARE(state->text(), QStringLiteral("started"));
     QVERIFY(cluster.isOnline());
-    QVERIFY(!window->widgetContainer()->findChild<QToolButton *>(QStringLiteral("_serviceStartActionToolButton"))->isEnabled());
+    QVERIFY(!_window->widgetContainer()->findChild<QToolButton *>(QStringLiteral("_serviceStartActionToolButton"))->isEnabled());
 
     // Stop, this time in force reread mode: the state is read back from the host.
     service->module().setData(1, Qt::Checked, Qt::CheckStateRole);
-    QVERIFY(clickButton(*window, "_serviceStopActionToolButton"));
+    QVERIFY(clickButton(*_window, "_serviceStopActionToolButton"));
     QVERIFY(waitIdle(60000));
     QTRY_COMPARE_WITH_TIMEOUT(shownState(service), QStringLiteral("stopped"), 20000);
     QTRY_VERIFY(status->toPlainText().contains(QStringLiteral("no server running")));
     QVERIFY(!cluster.isOnline());
     service->module().setData(1, Qt::Unchecked, Qt::CheckStateRole);
 
-    QVERIFY(HostFixtures::closeWindow(window));
-    qApp->setProperty("kvtAdminAllowChanges", QVariant());
 }
 
 void TestServices::readOnlyWithoutAllowChanges()
@@ -221,20 +228,19 @@ void TestServices::readOnlyWithoutAllowChanges()
     if (ServiceBackend::detect().kind() == ServiceBackend::None)
         QSKIP("this host has no service to list");
     qApp->setProperty("kvtAdminAllowChanges", QVariant());
-    std::unique_ptr<MainWindow> window = openMainWindow();
-    QVERIFY(chooseModule(*window, QStringLiteral("services")));
-    QVERIFY(window->currentModule()->data(2, Qt::DisplayRole).toString().contains(QStringLiteral("--allow-changes")));
+    _window = openMainWindow();
+    QVERIFY(chooseModule(*_window, QStringLiteral("services")));
+    QVERIFY(_window->currentModule()->data(2, Qt::DisplayRole).toString().contains(QStringLiteral("--allow-changes")));
     const QStringList services = ServiceBackend::detect().listServices(nullptr);
     QVERIFY(!services.isEmpty());
-    Element *service = chooseElement(*window, {QStringLiteral("Services"), services.first()});
+    Element *service = chooseElement(*_window, {QStringLiteral("Services"), services.first()});
     QVERIFY(service);
     QVERIFY(!service->isEditable());
     // Read, but none of the control actions is offered.
     QTRY_VERIFY_WITH_TIMEOUT(shownState(service) != QStringLiteral("unknown"), 20000);
     for (const char *button : {"_serviceStartActionToolButton", "_serviceStopActionToolButton",
                                "_serviceRestartActionToolButton", "_serviceReloadActionToolButton"})
-        QVERIFY2(!window->widgetContainer()->findChild<QToolButton *>(QLatin1String(button))->isEnabled(), button);
-    QVERIFY(HostFixtures::closeWindow(window));
+        QVERIFY2(!_window->widgetContainer()->findChild<QToolButton *>(QLatin1String(button))->isEnabled(), button);
 }
 
 QTEST_MAIN(TestServices)
