@@ -199,12 +199,13 @@ struct Command
  * change of groups, the groups) are read again so the window shows what the
  * system now holds.
  */
-class ChangeUserTask : public KvtAdmin::ElementGuarded<ElementTask>
+class ChangeUserTask : public ElementTask
 {
 public:
     ChangeUserTask(UserElement *user, ElementData *data, AccountsModule *module, const QString &description,
                    const QString &refusal, const QList<Command> &commands, bool groupsChanged)
-        : ElementGuarded(user, data)
+        : ElementTask(user, data)
+        , _guard(user)
         , _module(module)
         , _refusal(refusal)
         , _commands(commands)
@@ -240,13 +241,14 @@ public:
     {
         if (_taskDescription.status() == TaskDescription::Fail)
             return;
-        if (elementAlive())
-            _element->performOperation(ReadPropertyOperation, nullptr, 0);
+        if (_guard)
+            _guard->performOperation(ReadPropertyOperation, nullptr, 0);
         if (_groupsChanged && _module && !_module->groups()->requireLoad())
             _module->groups()->performOperation(ReadContentOperation, nullptr, 0);
     }
 
 private:
+    QPointer<Element> _guard;
     QPointer<AccountsModule> _module;
     QString _refusal;
     QList<Command> _commands;

@@ -130,7 +130,8 @@ inline ProgramResult runProgram(const QString &program, const QStringList &argum
  * A library task whose afterRun() is skipped once its element is gone: a
  * task can outlive the element it was made for (the plugin is unloaded or
  * the element list re-read while the task waits in the queue), and the
- * library's afterRun() would then touch a deleted element.
+ * library's afterRun() would then touch a deleted element. \a Base must
+ * define afterRun() (not the abstract ElementTask).
  */
 template <class Base>
 class ElementGuarded : public Base
