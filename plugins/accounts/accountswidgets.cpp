@@ -21,8 +21,8 @@
 
 namespace {
 
-// The choice proxy answers its choice role with a boolean; a role other
-// than the check state role keeps its ticked-rows filter working.
+// Roles of their own for the ticked and blocked state of a group, answered
+// as booleans by the choice proxy.
 const int choiceRole = Qt::UserRole + 100;
 const int blockRole = Qt::UserRole + 101;
 
