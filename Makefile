@@ -23,8 +23,11 @@ build: configure
 test: deps build
 	cd $(BUILD) && ctest --output-on-failure -j $(JOBS)
 
-demo: deps build
-	$(BUILD)/examples/host/kvt-demo-host $(ARGS)
+# kvt-admin on a sandbox of copied /etc files (apps/kvt-admin/demo.sh); only
+# the tool and its plugins are built.
+demo: deps configure
+	cmake --build $(BUILD) -j $(JOBS) --target kvt-admin
+	sh apps/kvt-admin/demo.sh $(BUILD) $(ARGS)
 
 bench: deps build
 	sh scripts/run-benchmarks.sh $(BUILD)

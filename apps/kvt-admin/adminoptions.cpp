@@ -30,8 +30,8 @@ void AdminOptions::addOptions(QCommandLineParser &parser)
     parser.addHelpOption();
     parser.addVersionOption();
     parser.addOption({QString::fromLatin1(pluginsOption),
-                      tr("Loads the plugins below <dir> (may be given more than once). Default: %1, "
-                         "and the folders of KVT_ADMIN_PLUGIN_PATH.")
+                      tr("Loads the plugins below <dir> (may be given more than once; default: %1). The "
+                         "folders of KVT_ADMIN_PLUGIN_PATH are loaded too.")
                           .arg(QStringLiteral(KVT_ADMIN_PLUGIN_INSTALL_DIR)),
                       tr("dir")});
     parser.addOption({QString::fromLatin1(listOption),
@@ -54,6 +54,9 @@ bool AdminOptions::read(const QCommandLineParser &parser, AdminOptions &options,
     options.pluginDirectories = parser.values(QString::fromLatin1(pluginsOption));
     if (options.pluginDirectories.isEmpty())
         options.pluginDirectories = defaultPluginDirectories();
+    else
+        options.pluginDirectories += environmentPluginDirectories();
+    options.pluginDirectories.removeDuplicates();
     options.list = parser.isSet(QString::fromLatin1(listOption));
     options.screenshot = parser.value(QString::fromLatin1(screenshotOption));
     if (parser.isSet(QString::fromLatin1(screenshotOption)) && options.screenshot.isEmpty()) {
@@ -76,12 +79,19 @@ QStringList AdminOptions::defaultPluginDirectories()
 {
     QStringList directories;
     directories << QString::fromLatin1(runsFromBuildTree() ? KVT_ADMIN_PLUGIN_BUILD_DIR : KVT_ADMIN_PLUGIN_INSTALL_DIR);
+    directories += environmentPluginDirectories();
+    directories.removeDuplicates();
+    return directories;
+}
+
+QStringList AdminOptions::environmentPluginDirectories()
+{
+    QStringList directories;
     const QString extra = qEnvironmentVariable("KVT_ADMIN_PLUGIN_PATH");
     for (const QString &dir : extra.split(QLatin1Char(':'))) {
         if (!dir.isEmpty())
             directories << dir;
     }
-    directories.removeDuplicates();
     return directories;
 }
 

@@ -38,6 +38,8 @@ public:
      * folder of KVT_ADMIN_PLUGIN_PATH (separated by ":").
      */
     static QStringList defaultPluginDirectories();
+    //! The folders of KVT_ADMIN_PLUGIN_PATH, which are loaded in any case.
+    static QStringList environmentPluginDirectories();
     //! Where the tool's translations are looked for, in order.
     static QStringList translationDirectories();
 };

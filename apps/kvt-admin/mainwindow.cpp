@@ -285,6 +285,11 @@ void MainWindow::pluginsReset()
 {
     _elements->pluginContainerReset(_plugins->rootNode());
     _moduleView->expandAll();
+    // The first module is chosen, so its elements are on show at once.
+    const QModelIndex first = _plugins->treeNodeModel()->index(0, 0);
+    if (first.isValid())
+        _moduleView->selectionModel()->setCurrentIndex(first, QItemSelectionModel::ClearAndSelect
+                                                                  | QItemSelectionModel::Rows);
     updateActions();
 }
 
@@ -606,11 +611,15 @@ bool MainWindow::tasksIdle()
 bool MainWindow::waitForTasks(int timeoutMs)
 {
     QDeadlineTimer deadline(timeoutMs);
+    // Sleeps until an event comes (a task's completion, or the timer at the
+    // deadline) rather than polling: the workers get the processor.
+    QTimer wake;
+    wake.setSingleShot(true);
+    wake.start(timeoutMs);
     while (!tasksIdle()) {
         if (deadline.hasExpired())
             return false;
-        QCoreApplication::processEvents(QEventLoop::AllEvents, 20);
-        QCoreApplication::sendPostedEvents();
+        QCoreApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents);
     }
     QCoreApplication::processEvents();
     return true;
@@ -656,7 +665,8 @@ void MainWindow::loadSettings()
     QSettings settings;
     restoreGeometry(settings.value(QLatin1String(geometryKey)).toByteArray());
     restoreState(settings.value(QLatin1String(stateKey)).toByteArray());
-    _splitter->restoreState(settings.value(QLatin1String(splitterKey)).toByteArray());
+    if (!_splitter->restoreState(settings.value(QLatin1String(splitterKey)).toByteArray()))
+        _splitter->setSizes({260, 320, 520});
 }
 
 void MainWindow::saveSettings() const

@@ -5,6 +5,7 @@
 #include "conffileelements.h"
 
 #include <kvt-common/elementdata.h>
+#include <kvt-common/elementwidget.h>
 #include <kvt-common/module.h>
 
 #include <QCoreApplication>
@@ -200,6 +201,12 @@ void UpdateKeyTask::afterRun()
         return;
     if (_taskDescription.status() != TaskDescription::Fail)
         _key->setEntry(_entry);
+    // Outside force reread mode the base clears the changes of the edit
+    // widget; when the widget shows another key by now (the user applied on
+    // leaving), those changes are that key's and stay.
+    auto *widget = qobject_cast<ElementWidget *>(_key->elementWidget(EditElementRole));
+    if (!forceReread(_key) && widget && widget->element() != _key)
+        return;
     UpdateTask::afterRun();
 }
 

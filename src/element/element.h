@@ -48,6 +48,14 @@ public:
 
     // Virtual interface added to TreeNode's; the order of declaration is
     // part of the binary interface that plugins are built against.
+    /*!
+     * The module's widget for the element's type (null for the create role
+     * of a persistent element). The widget container shows a create-role
+     * widget without an element; a container element under which new
+     * elements are created overrides this to tell its widget where they go
+     * (CreateTask's afterRun() asks the container for its create-role
+     * widget too).
+     */
     virtual ElementWidget *elementWidget(ElementWidgetRole role);
     virtual int displayChildrenVariant() const;
     virtual QStringList displayChildrenVariants() const;

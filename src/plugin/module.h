@@ -45,6 +45,18 @@ public:
 
     // Virtual interface added to TreeNode's; the order of declaration is
     // part of the binary interface that plugins are built against.
+    /*!
+     * Every operation on the module's elements and element widgets arrives
+     * here. The record \a data is new and handed over with
+     * CreateOperation (a create-role ViewEditElementWidget sends its
+     * exportElementData(), with the widget as \a context and no element:
+     * the widget is shown with setElement(nullptr, CreateElementRole)),
+     * with UpdateOperation (applyContentChanges()) and with
+     * ReadContentOperation after a creation in force reread mode
+     * (CreateTask); the module gives it to the task it starts, or deletes
+     * it. With ChangeDisplayOperation the record belongs to the caller.
+     * The base hands the call on to the child modules.
+     */
     virtual void performOperation(ContextOperation *context, OperationType type, ElementData *data,
                                   int flags);
     virtual void loadSettings();

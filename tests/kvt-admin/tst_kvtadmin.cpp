@@ -93,6 +93,7 @@ private Q_SLOTS:
     void readShowsKeysAndValues();
     void applyWritesOneLine_data();
     void applyWritesOneLine();
+    void createAndDeleteKey_data();
     void createAndDeleteKey();
     void leavingEditedKeyAsks_data();
     void leavingEditedKeyAsks();
@@ -250,8 +251,18 @@ void TestKvtAdmin::applyWritesOneLine()
     QVERIFY(taskRows().isEmpty()); // all went well: the list was cleared
 }
 
+void TestKvtAdmin::createAndDeleteKey_data()
+{
+    QTest::addColumn<bool>("forceReread");
+    // Trusting the task's result, or reading the file again after it.
+    QTest::newRow("result trusted") << false;
+    QTest::newRow("force reread mode") << true;
+}
+
 void TestKvtAdmin::createAndDeleteKey()
 {
+    QFETCH(bool, forceReread);
+    QSettings().setValue(QStringLiteral("module/conffilesparanoid"), forceReread);
     open({QStringLiteral("sample.conf")});
     const QString path = _sandbox->path(QStringLiteral("sample.conf"));
     QVERIFY(chooseElement(*_window, {path}));
