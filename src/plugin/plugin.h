@@ -33,7 +33,9 @@ Q_DECLARE_INTERFACE(Plugin, KVT_PLUGIN_IID)
  * Objects in modules() that are not Module objects are ignored.
  *
  * A plugin that cannot work on the current host returns false from
- * isValid(): it is unloaded and offers nothing.
+ * isValid(): it is unloaded and offers nothing. Its dynamic property
+ * "unavailableReason" (a sentence, set in its constructor) is added to what
+ * the plugin list says of the refused file.
  */
 class KVTCOMMON_EXPORT Plugin : public QObject
 {

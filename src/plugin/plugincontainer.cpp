@@ -25,6 +25,8 @@ namespace {
 // Why a loaded file was refused, kept on its loader: the loader itself
 // reports no error for a file that loaded well.
 const char refusalProperty[] = "_kvt_refusal";
+// The sentence a refused plugin gives for itself (see Plugin).
+const char unavailableReasonProperty[] = "unavailableReason";
 
 // The two module signals the container re-emits, looked up once. Connecting
 // by meta-method makes exactly the connections that the SIGNAL() form makes,
@@ -218,7 +220,10 @@ bool PluginContainer::loadPlugin(const QString &filePath)
         refusal = tr("The plugin does not implement the interface %1.")
                       .arg(QLatin1String(KVT_PLUGIN_IID));
     else if (!plugin->isValid())
-        refusal = tr("The plugin cannot work on this system.");
+        refusal = QStringList{tr("The plugin cannot work on this system."),
+                              plugin->property(unavailableReasonProperty).toString()}
+                      .join(QLatin1Char(' '))
+                      .trimmed();
     if (!refusal.isEmpty()) {
         loader->setProperty(refusalProperty, refusal);
         loader->unload();

@@ -21,6 +21,12 @@ class AbstractTask;
  * Destroying any one Thread stops them all, and tasks still waiting in the
  * ring are deleted without running. Workers cannot be restarted afterwards in
  * the same process.
+ *
+ * A task put here directly, not through TaskObserver::performTask(), gets
+ * no row in the task list, but its completion is still handled by the
+ * observer: afterRun() and deletion in the interface thread. put() refuses a
+ * task (false, the caller keeps it) while the ring is full or before the
+ * first worker has started.
  */
 class KVTCOMMON_EXPORT Thread : public QThread
 {

@@ -18,7 +18,12 @@ class TreeNode;
  * - controls report edits through changeContent(); contentChanged() tells
  *   0 (no unsaved changes), 2 (changed, not valid) or 3 (changed, valid).
  * - applyContentChanges() updates the element, or creates a new one when
- *   the widget has none, with the record of exportElementData().
+ *   the widget has none, with the record of exportElementData(). The record
+ *   is new; the module's performOperation() takes it over (as a rule by
+ *   handing it to its task) and deletes it when it starts nothing.
+ * - in the create role the widget has no element (the container shows it
+ *   with none); a module that needs to know where to create remembers the
+ *   container element whose Element::elementWidget() was asked for role 2.
  *
  * A failed task calls no hook: the widget stays blocked after a failed read
  * and keeps its changes after a failed update.

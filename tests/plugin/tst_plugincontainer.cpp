@@ -148,7 +148,8 @@ private Q_SLOTS:
 
         QTest::newRow("accepted") << "valid.so" << "valid plugin" << "The plugin valid plugin"
                                   << QStringList{"alpha|alpha module", "|", "alpha-child|alpha-child module"};
-        QTest::newRow("not valid") << "invalid.so" << "" << "The plugin cannot work on this system." << QStringList();
+        QTest::newRow("not valid") << "invalid.so" << "" << "The plugin cannot work on this system. It needs a host it does not have."
+                                   << QStringList();
         QTest::newRow("not a shared object") << "broken.so" << "" << "broken.so" << QStringList();
     }
 

@@ -31,6 +31,8 @@ public:
         _name = QStringLiteral(TEST_PLUGIN_NAME);
         _description = QStringLiteral("The plugin ") + _name;
         _availableOperationsClass = TEST_PLUGIN_MASK;
+        if (!TEST_PLUGIN_VALID)
+            setProperty("unavailableReason", QStringLiteral("It needs a host it does not have."));
         for (const QString &entry : QStringLiteral(TEST_PLUGIN_MODULES).split(QLatin1Char(','))) {
             const QString parentId = entry.section(QLatin1Char('/'), 0, -2);
             const QString id = entry.section(QLatin1Char('/'), -1);
