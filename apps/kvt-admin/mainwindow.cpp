@@ -275,6 +275,12 @@ QString MainWindow::pluginFilePath(int entry) const
 
 void MainWindow::pluginsAboutToBeReset()
 {
+    // The module's actions go with the plugins: take them off the tool bar first.
+    for (const QPointer<QAction> &action : qAsConst(_moduleActions)) {
+        if (action)
+            _toolBar->removeAction(action);
+    }
+    _moduleActions.clear();
     _widgetContainer->reset();
     _shownElement = nullptr;
     _shownModule = nullptr;
@@ -489,10 +495,16 @@ void MainWindow::updateActions()
                                       : !_plugins->modules().isEmpty());
 
     // The module's own actions for the element's type follow the element.
-    for (QAction *action : qAsConst(_moduleActions))
-        _toolBar->removeAction(action);
-    _moduleActions = element ? element->elementActions() : QList<QAction *>();
-    _toolBar->addActions(_moduleActions);
+    // Guarded: a module deletes its actions with itself when its plugin is unloaded.
+    for (const QPointer<QAction> &action : qAsConst(_moduleActions)) {
+        if (action)
+            _toolBar->removeAction(action);
+    }
+    _moduleActions.clear();
+    const QList<QAction *> actions = element ? element->elementActions() : QList<QAction *>();
+    for (QAction *action : actions)
+        _moduleActions.append(action);
+    _toolBar->addActions(actions);
 }
 
 void MainWindow::createElement()
@@ -573,7 +585,10 @@ QMenu *MainWindow::elementMenu()
     menu->addActions({_applyAction, _cancelAction, _rereadAction});
     if (!_moduleActions.isEmpty()) {
         menu->addSeparator();
-        menu->addActions(_moduleActions);
+        for (const QPointer<QAction> &action : qAsConst(_moduleActions)) {
+            if (action)
+                menu->addAction(action);
+        }
     }
     return menu;
 }

@@ -136,7 +136,7 @@ private:
     QAction *_taskDialogAction;
     QAction *_quitAction;
     QAction *_elementActionsSeparator;
-    QList<QAction *> _moduleActions;
+    QList<QPointer<QAction>> _moduleActions;
     QPointer<Element> _shownElement;
     QPointer<Module> _shownModule;
     bool _restoring = false;

@@ -32,9 +32,6 @@ bool closeWindow(std::unique_ptr<MainWindow> &window)
     // Whatever a failed check left unapplied is discarded, not asked about.
     if (ViewEditElementWidget *widget = window->shownEditWidget())
         widget->setUnchanged();
-    window->elementView()->clearSelection();
-    window->elementView()->setCurrentIndex(QModelIndex());
-    idle = AdminTest::waitIdle() && idle;
     window.reset();
     return idle;
 }
