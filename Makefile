@@ -24,11 +24,13 @@ test:
 	$(MAKE) build
 	cd $(BUILD) && ctest --output-on-failure -j $(JOBS)
 
+# kvt-admin on a sandbox of copied /etc files (apps/kvt-admin/demo.sh); only
+# the tool and its plugins are built.
 demo:
 	sh scripts/install-deps.sh demo
 	$(MAKE) configure
-	cmake --build $(BUILD) -j $(JOBS) --target kvt_demo
-	$(BUILD)/examples/host/kvt-demo-host $(ARGS)
+	cmake --build $(BUILD) -j $(JOBS) --target kvt-admin
+	sh apps/kvt-admin/demo.sh $(BUILD) $(ARGS)
 
 bench:
 	sh scripts/install-deps.sh bench

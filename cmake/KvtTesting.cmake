@@ -24,6 +24,13 @@ if(KVT_SANITIZE)
         "LSAN_OPTIONS=suppressions=${PROJECT_SOURCE_DIR}/tests/lsan.supp:print_suppressions=0")
 endif()
 
+# The environment of one test: its own home, settings and data folders, the
+# C.UTF-8 locale, the sanitizer options, then the given extra entries.
+function(_kvt_test_environment out test platform extra)
+    set(home "${KVT_TEST_HOME_ROOT}/${test}")
+    set(${out} "${platform};HOME=${home};XDG_CONFIG_HOME=${home}/config;XDG_DATA_HOME=${home}/data;XDG_CACHE_HOME=${home}/cache;LC_ALL=C.UTF-8;LANG=C.UTF-8;KVT_TEST_HOME=${home};${KVT_SANITIZER_ENV};${extra}" PARENT_SCOPE)
+endfunction()
+
 function(kvt_add_test name)
     cmake_parse_arguments(ARG "" "" "SOURCES;LIBS;ENV;FUNCTIONS" ${ARGN})
     add_executable(${name} ${ARG_SOURCES})
@@ -39,10 +46,30 @@ function(kvt_add_test name)
         set(tests ${name})
     endif()
     foreach(test IN LISTS tests)
-        set(home "${KVT_TEST_HOME_ROOT}/${test}")
+        _kvt_test_environment(env ${test} "QT_QPA_PLATFORM=offscreen" "${ARG_ENV}")
         set_tests_properties(${test} PROPERTIES
+            FIXTURES_REQUIRED kvt_test_home
+            TIMEOUT 300
+            ENVIRONMENT "${env}")
+    endforeach()
+endfunction()
+
+# kvt_add_gui_test(<name> SOURCES <file>... [LIBS <target>...] [ENV <VAR=value>...])
+#
+# Like kvt_add_test, but the test runs in a real X server: the wrapper
+# tests/support/run-in-xvfb.sh starts Xvfb on a free display, runs the test
+# there on the xcb platform and stops the server. When Xvfb cannot start, the
+# wrapper says why and the test is reported as skipped.
+function(kvt_add_gui_test name)
+    cmake_parse_arguments(ARG "" "" "SOURCES;LIBS;ENV" ${ARGN})
+    add_executable(${name} ${ARG_SOURCES})
+    target_link_libraries(${name} PRIVATE KvtCommon::KvtCommon kvttestsupport Qt5::Test ${ARG_LIBS})
+    add_test(NAME ${name}
+             COMMAND sh "${PROJECT_SOURCE_DIR}/tests/support/run-in-xvfb.sh" $<TARGET_FILE:${name}>)
+    _kvt_test_environment(env ${name} "KVT_GUI_TEST=1" "${ARG_ENV}")
+    set_tests_properties(${name} PROPERTIES
         FIXTURES_REQUIRED kvt_test_home
         TIMEOUT 300
-        ENVIRONMENT "QT_QPA_PLATFORM=offscreen;HOME=${home};XDG_CONFIG_HOME=${home}/config;XDG_DATA_HOME=${home}/data;XDG_CACHE_HOME=${home}/cache;LC_ALL=C.UTF-8;LANG=C.UTF-8;KVT_TEST_HOME=${home};${KVT_SANITIZER_ENV};${ARG_ENV}")
-    endforeach()
+        SKIP_RETURN_CODE 77
+        ENVIRONMENT "${env}")
 endfunction()
