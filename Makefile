@@ -1,13 +1,19 @@
 # Thin wrapper over CMake. The build folder is build/ (build-asan/ for the
-# sanitizer build). Each command installs only the Debian packages it needs.
+# address sanitizer build, build-tsan/ for the thread sanitizer build). Each
+# command installs only the Debian packages it needs.
 
 BUILD      ?= build
 ASAN_BUILD ?= build-asan
+TSAN_BUILD ?= build-tsan
+# The tests that run work on threads: tasks, observer, service tasks,
+# processes, PostgreSQL.
+TSAN_TARGETS ?= tst_thread tst_taskobserver tst_elementtasks tst_servicetasks tst_process tst_pgsql
+TSAN_TESTS   ?= ^(tst_thread|tst_taskobserver|tst_elementtasks|tst_servicetasks|tst_process|tst_pgsql)
 JOBS       ?= $(shell nproc 2>/dev/null || echo 2)
 CMAKE_ARGS ?=
 PREFIX     ?= /usr/local
 
-.PHONY: all configure build test demo bench install asan-test clean lupdate deb
+.PHONY: all configure build test demo bench install asan-test tsan-test clean lupdate docs deb
 
 all: build
 
@@ -47,6 +53,19 @@ asan-test:
 	cmake --build $(ASAN_BUILD) -j $(JOBS)
 	cd $(ASAN_BUILD) && ctest --output-on-failure -j $(JOBS)
 
+tsan-test:
+	sh scripts/install-deps.sh test
+	cmake -S . -B $(TSAN_BUILD) -DCMAKE_BUILD_TYPE=Debug -DKVT_TSAN=ON -DKVT_BUILD_EXAMPLES=OFF $(CMAKE_ARGS)
+	cmake --build $(TSAN_BUILD) -j $(JOBS) --target $(TSAN_TARGETS)
+	cd $(TSAN_BUILD) && ctest --output-on-failure -j $(JOBS) -R '$(TSAN_TESTS)'
+
+# The API reference (HTML and Qt help file) in $(BUILD)/docs/; installed by
+# `make install` once built this way.
+docs:
+	sh scripts/install-deps.sh docs
+	cmake -S . -B $(BUILD) -DKVT_BUILD_DOCS=ON -DCMAKE_INSTALL_PREFIX=$(PREFIX) $(CMAKE_ARGS)
+	cmake --build $(BUILD) --target docs
+
 # Debian packages of the tree, written to ../ as dpkg-buildpackage does.
 deb:
 	sh scripts/install-deps.sh package
@@ -56,4 +75,4 @@ lupdate: configure
 	cmake --build $(BUILD) --target lupdate
 
 clean:
-	rm -rf $(BUILD) $(ASAN_BUILD)
+	rm -rf $(BUILD) $(ASAN_BUILD) $(TSAN_BUILD)

@@ -28,6 +28,13 @@ if(KVT_SANITIZE)
     add_link_options(-fsanitize=address,undefined -fno-sanitize-recover=all)
 endif()
 
+# ThreadSanitizer: the library and its tests are instrumented, Qt is not;
+# tests/tsan.supp explains what that costs.
+if(KVT_TSAN)
+    add_compile_options(-fsanitize=thread -fno-omit-frame-pointer)
+    add_link_options(-fsanitize=thread)
+endif()
+
 # Where translations live once installed. The build tree mirrors the install
 # layout (the library in <build>/<libdir>, translations in <build>/<datadir>/...)
 # so that the library finds its translations from its own location in both.

@@ -23,6 +23,11 @@ if(KVT_SANITIZE)
         "UBSAN_OPTIONS=halt_on_error=1:print_stacktrace=1"
         "LSAN_OPTIONS=suppressions=${PROJECT_SOURCE_DIR}/tests/lsan.supp:print_suppressions=0")
 endif()
+if(KVT_TSAN)
+    # Any report fails the test (exit code 66).
+    set(KVT_SANITIZER_ENV
+        "TSAN_OPTIONS=suppressions=${PROJECT_SOURCE_DIR}/tests/tsan.supp:halt_on_error=1:exitcode=66:second_deadlock_stack=1:print_suppressions=0")
+endif()
 
 # The environment of one test: its own home, settings and data folders, the
 # C.UTF-8 locale, the sanitizer options, then the given extra entries.

@@ -10,7 +10,7 @@
 #   demo     build + run the demo host
 #   bench    build + run the benchmarks (Google Benchmark)
 #   package  build the Debian packages (debhelper, lintian, test tools)
-#   docs     build the API reference
+#   docs     build the API reference (Doxygen, qhelpgenerator)
 #   lint     check licence information (reuse)
 #
 # Only missing packages are installed, and the package lists are refreshed only
@@ -53,6 +53,7 @@ xauth
 "
 docs="
 doxygen
+qhelpgenerator-qt5
 "
 lint="
 reuse

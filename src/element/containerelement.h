@@ -18,7 +18,9 @@ class KVTCOMMON_EXPORT ContainerElement : public Element
     Q_OBJECT
 
 public:
+    //! Creates a container whose children are still to be read.
     ContainerElement(Module &module, RightsPredicate rights);
+    //! Destroys the element (see Element::~Element()).
     ~ContainerElement() override;
 
     quint64 availableOperations() const override;

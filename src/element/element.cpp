@@ -2,6 +2,7 @@
 
 #include "elementdata.h"
 #include "elementtreeops_p.h"
+#include "elementwidget_p.h"
 #include "module.h"
 
 #include <QSet>
@@ -34,6 +35,8 @@ Element::~Element()
     dyingElements.insert(this);
     reset();
     dyingElements.remove(this);
+    // Widgets keep a plain pointer to their element: they let go of it now.
+    KvtElementWidgets::elementDestroyed(this);
     delete _elementData;
     _elementData = nullptr;
 }

@@ -17,7 +17,9 @@ class KVTCOMMON_EXPORT ElementContainer : public NodeContainer
     Q_OBJECT
 
 public:
+    //! Creates an empty element tree and its ElementModel, both owned by the container.
     explicit ElementContainer(QObject *parent = nullptr);
+    //! Destroys the container, the root and the model; the elements belong to their modules.
     ~ElementContainer() override;
 
     /*!

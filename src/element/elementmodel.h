@@ -13,8 +13,11 @@ class KVTCOMMON_EXPORT ElementModel : public TreeNodeModel, public virtual Eleme
     Q_OBJECT
 
 public:
+    //! Creates an empty model.
     explicit ElementModel(QObject *parent = nullptr);
+    //! Creates a model of the tree under \a root (not owned).
     explicit ElementModel(TreeNode *root, QObject *parent = nullptr);
+    //! Destroys the model.
     ~ElementModel() override;
 };
 

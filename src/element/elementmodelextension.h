@@ -21,11 +21,16 @@ class Element;
 class KVTCOMMON_EXPORT ElementModelExtension : public virtual TreeNodeModelExtension
 {
 public:
+    //! Creates the extension.
     ElementModelExtension();
+    //! Destroys the extension.
     virtual ~ElementModelExtension();
 
+    //! The element of \a index, or null.
     Element *toElement(const QModelIndex &index) const;
+    //! The element of the first index of \a range that has a node, or null.
     Element *toElement(const QItemSelectionRange &range) const;
+    //! The element of the first range of \a selection that has a node, or null.
     Element *toElement(const QItemSelection &selection) const;
 };
 

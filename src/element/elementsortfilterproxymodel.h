@@ -17,9 +17,12 @@ class KVTCOMMON_EXPORT ElementSortFilterProxyModel : public TreeNodeSortFilterPr
     Q_OBJECT
 
 public:
+    //! Creates a proxy over every column; see TreeNodeSortFilterProxyModel.
     explicit ElementSortFilterProxyModel(int specialFlagsFilter, QObject *parent = nullptr);
+    //! Creates a proxy that shows only the source columns in \a acceptColumns.
     ElementSortFilterProxyModel(QSet<int> acceptColumns, int specialFlagsFilter,
                                 QObject *parent = nullptr);
+    //! Destroys the proxy.
     ~ElementSortFilterProxyModel() override;
 };
 

@@ -1,6 +1,10 @@
 #ifndef KVT_ELEMENTWIDGETROLE_H
 #define KVT_ELEMENTWIDGETROLE_H
 
+/*! \file elementwidgetrole.h
+ * The roles in which an element widget shows its element.
+ */
+
 /*! What an element widget is doing with its element. */
 enum ElementWidgetRole {
     NoElementRole = 0,     //!< no element assigned

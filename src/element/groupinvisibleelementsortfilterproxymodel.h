@@ -18,10 +18,14 @@ class KVTCOMMON_EXPORT GroupInvisibleElementSortFilterProxyModel : public Elemen
     Q_OBJECT
 
 public:
+    //! Creates a proxy over every column that shows every group.
     explicit GroupInvisibleElementSortFilterProxyModel(QObject *parent = nullptr);
+    //! Creates a proxy over the columns in \a acceptColumns that shows every group.
     GroupInvisibleElementSortFilterProxyModel(QSet<int> acceptColumns, QObject *parent = nullptr);
+    //! Destroys the proxy.
     ~GroupInvisibleElementSortFilterProxyModel() override;
 
+    //! The group shown; "Undefined" shows all.
     QString groupElementType() const;
     /*! Takes \a type and filters again; unless \a force is true, the type
      *  already set is left alone without filtering. Forcing is for a tree
@@ -29,8 +33,10 @@ public:
     void setGroupElementType(const QString &type, bool force = false);
 
 protected:
+    //! Accepts the rows of the group (see the class description).
     bool filterAcceptsRow(int sourceRow, const QModelIndex &sourceParent) const override;
 
+    //! See groupElementType().
     QString _groupElementType;
 };
 

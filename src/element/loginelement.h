@@ -14,7 +14,9 @@ class KVTCOMMON_EXPORT LoginElement : public Element
     Q_OBJECT
 
 public:
+    //! Creates the element with its record ("user" empty, "isLogin" false).
     LoginElement(Module &module, RightsPredicate rights);
+    //! Destroys the element and its record.
     ~LoginElement() override;
 
     quint64 availableOperations() const override;

@@ -24,20 +24,30 @@ class KVTCOMMON_EXPORT NodeContainer : public QObject
     Q_OBJECT
 
 public:
+    //! Creates a container without root or model.
     explicit NodeContainer(QObject *parent = nullptr);
+    //! Destroys the container.
     ~NodeContainer() override;
 
+    //! The root of the container's tree.
     TreeNode *rootNode() const { return _rootNode; }
+    //! The model that shows the tree; give it to views.
     TreeNodeModel *treeNodeModel() const { return _treeNodeModel; }
 
 Q_SIGNALS:
+    //! The tree is about to be rebuilt as a whole.
     void nodeContainerAboutToBeReset();
+    //! The tree has been rebuilt under \a root.
     void nodeContainerReset(const TreeNode *root);
+    //! Views are asked to make \a node current.
     void setCurrentNode(TreeNode *node);
+    //! Views are asked to expand \a node.
     void expandCurrentNode(TreeNode *node);
 
 protected:
+    //! See rootNode(); set by the derived container.
     TreeNode *_rootNode;
+    //! See treeNodeModel(); set by the derived container.
     TreeNodeModel *_treeNodeModel;
 };
 

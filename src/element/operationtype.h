@@ -1,6 +1,10 @@
 #ifndef KVT_OPERATIONTYPE_H
 #define KVT_OPERATIONTYPE_H
 
+/*! \file operationtype.h
+ * The operation codes of elements and element widgets.
+ */
+
 /*!
  * Operations that can be performed on an element or an element widget. Each
  * value is a single bit, so a set of operations is their bitwise or, kept in

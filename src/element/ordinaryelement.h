@@ -18,7 +18,9 @@ class KVTCOMMON_EXPORT OrdinaryElement : public Element
     Q_OBJECT
 
 public:
+    //! Creates the element.
     OrdinaryElement(Module &module, RightsPredicate rights);
+    //! Destroys the element (see Element::~Element()).
     ~OrdinaryElement() override;
 
     quint64 availableOperations() const override;

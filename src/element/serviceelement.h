@@ -15,9 +15,12 @@ class KVTCOMMON_EXPORT ServiceElement : public Element
     Q_OBJECT
 
 public:
+    //! Creates the element with an empty ServiceLightElementData.
     ServiceElement(Module &module, RightsPredicate rights);
+    //! Destroys the element and its record.
     ~ServiceElement() override;
 
+    //! Adds the start or stop icon in column 0 once the state is known.
     QVariant data(int column, int role) const override;
 
     /*! "media-playback-start" of the icon theme; null without one. */

@@ -13,9 +13,12 @@ class KVTCOMMON_EXPORT SupplementElement : public Element
     Q_OBJECT
 
 public:
+    //! Creates the element.
     SupplementElement(Module &module, RightsPredicate rights);
+    //! Destroys the element (see Element::~Element()).
     ~SupplementElement() override;
 
+    //! The special flag 1: hidden by the proxies that leave supplements out.
     int treeNodeSpecialFlags() const override;
     quint64 availableOperations() const override;
     void performOperation(OperationType type, ElementData *data, int flags) override;

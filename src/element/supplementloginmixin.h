@@ -20,15 +20,18 @@ class Element;
 class KVTCOMMON_EXPORT SupplementLoginMixin
 {
 public:
+    //! Creates the helper of \a element (not owned), normally the element that holds it.
     explicit SupplementLoginMixin(Element *element);
 
     /*! \a flags, with the special flag 1 set when the element's parent element has data
      *  whose "isLogin" is not true. */
     int treeNodeSpecialFlags(int flags) const;
 
+    //! The element the helper serves.
     Element *element() const { return _element; }
 
 protected:
+    //! See element().
     Element *_element;
 };
 

@@ -16,8 +16,14 @@ class KVTCOMMON_EXPORT AcceptorModule : public Module
     Q_OBJECT
 
 public:
+    /*!
+     * Creates the module \a name, hung by the tree loader at \a expectedDepth under
+     * the module whose id is \a expectedParentId (the donor), with \a description
+     * in its module data.
+     */
     AcceptorModule(const QString &name, int expectedDepth, const QString &expectedParentId,
                    const QString &description, QObject *parent = nullptr);
+    //! Destroys the module.
     ~AcceptorModule() override;
 
     /*! The donor's element with the id \a name; null when there is none or

@@ -13,10 +13,14 @@ class KVTCOMMON_EXPORT ModuleRootTreeNode : public TreeNode
     Q_OBJECT
 
 public:
+    //! Creates the empty root (depth 0, empty id).
     explicit ModuleRootTreeNode(QObject *parent = nullptr);
+    //! Destroys the root; the modules are detached, not deleted.
     ~ModuleRootTreeNode() override;
 
+    //! Three columns: "Name", "Reread" and "Description".
     int columnCount() const override;
+    //! The translated column names for the horizontal header.
     QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
 };
 

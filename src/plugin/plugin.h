@@ -8,6 +8,10 @@
 #include <QString>
 #include <QtGlobal>
 
+/*! \file plugin.h
+ * The plugin interface: the Plugin base class and its interface id.
+ */
+
 class Plugin;
 
 /*!
@@ -37,23 +41,39 @@ class KVTCOMMON_EXPORT Plugin : public QObject
     Q_INTERFACES(Plugin)
 
 public:
+    //! Creates an empty plugin: no name, no modules, operation classes 0.
     explicit Plugin(QObject *parent = nullptr);
+    //! Destroys the plugin, and with it the modules that are its QObject children.
     ~Plugin() override;
 
     // Virtual interface added to QObject's; the order of declaration is part
     // of the binary interface that plugins are built against.
+    /*!
+     * Whether the plugin can work on this host (a program or file it needs is
+     * there). True in the base. A plugin that is not valid is unloaded at once and
+     * shows as refused in the plugin list.
+     */
     virtual bool isValid() const;
 
+    //! The bit mask of the classes of operation the plugin's modules offer.
     quint64 availableOperationsClass() const { return _availableOperationsClass; }
+    //! The plugin's display name.
     QString name() const { return _name; }
+    //! A sentence for the plugin list.
     QString description() const { return _description; }
+    //! The plugin's modules; the constructor appends them.
     QList<QObject *> &modules() { return _modules; }
+    //! The plugin's modules.
     const QList<QObject *> &modules() const { return _modules; }
 
 protected:
+    //! See availableOperationsClass(); set by the plugin's constructor.
     quint64 _availableOperationsClass;
+    //! See name(); set by the plugin's constructor (translated).
     QString _name;
+    //! See description(); set by the plugin's constructor (translated).
     QString _description;
+    //! See modules(); the plugin's constructor appends its Module objects, created as its children.
     QList<QObject *> _modules;
 };
 

@@ -1,4 +1,5 @@
 #include "plugincontainer.h"
+#include "plugincontainer_p.h"
 
 #include "module.h"
 #include "moduleroottreenode.h"
@@ -6,13 +7,17 @@
 #include "plugindialog.h"
 #include "pluginmodel.h"
 #include "treenodemodel.h"
+#include "kvtlogging_p.h"
 
 #include <QApplication>
 #include <QDirIterator>
+#include <QHash>
 #include <QFileInfo>
 #include <QMessageBox>
 #include <QMetaMethod>
 #include <QPluginLoader>
+#include <QPointer>
+#include <QPushButton>
 #include <QWidget>
 
 namespace {
@@ -48,7 +53,38 @@ const RelayedSignals &relayedSignals()
     return relayed;
 }
 
+// Loads in progress. Events are processed during a load, and an event may ask
+// the same container to load or unload again: that request waits until the
+// running load is done (the last request wins), instead of pulling the
+// plugins out from under it.
+struct LoadState
+{
+    enum Request { None, Load, Unload };
+    Request deferred = None;
+    QString deferredDirectory;
+    bool ownUnload = false; // the unload that a load itself starts with
+};
+
+QHash<const PluginContainer *, LoadState> &loadStates()
+{
+    static QHash<const PluginContainer *, LoadState> states;
+    return states;
+}
+
+void enableChangeButton(QWidget *dialog, bool enable)
+{
+    if (!dialog)
+        return;
+    if (auto *button = dialog->findChild<QPushButton *>(QStringLiteral("_changePushButton")))
+        button->setEnabled(enable);
+}
+
 } // namespace
+
+bool KvtPluginLoading::isLoading(const PluginContainer *container)
+{
+    return loadStates().contains(container);
+}
 
 PluginContainer::PluginContainer(QObject *parent)
     : NodeContainer(parent)
@@ -66,6 +102,9 @@ PluginContainer::PluginContainer(QObject *parent)
 
 PluginContainer::~PluginContainer()
 {
+    // Destroyed from an event during its own load: the load stops (it
+    // watches this object) and the plugins go now.
+    loadStates().remove(this);
     unloadPlugins();
     // With a parent widget the dialog belongs to that widget and may outlive
     // the container; it lets go of the container when the container is
@@ -80,12 +119,51 @@ PluginContainer::~PluginContainer()
 
 void PluginContainer::loadPlugins(const QString &directory)
 {
+    if (loadStates().contains(this)) {
+        LoadState &state = loadStates()[this];
+        state.deferred = LoadState::Load;
+        state.deferredDirectory = directory;
+        qCWarning(KVT_PLUGIN, "PluginContainer::loadPlugins(\"%s\") called during a load: deferred until that load ends",
+                  qPrintable(directory));
+        return;
+    }
+    loadStates().insert(this, LoadState());
+    enableChangeButton(_pluginDialog, false);
+    const QPointer<PluginContainer> self(this);
+
+    QString next = directory;
+    LoadState::Request request = LoadState::Load;
+    while (request != LoadState::None) {
+        if (request == LoadState::Load)
+            loadDirectory(next);
+        else
+            unloadWhileLoading();
+        if (!self)
+            return; // destroyed by an event processed during the load
+        LoadState &state = loadStates()[this];
+        request = state.deferred;
+        next = state.deferredDirectory;
+        state.deferred = LoadState::None;
+    }
+    loadStates().remove(this);
+    enableChangeButton(_pluginDialog, true);
+}
+
+void PluginContainer::unloadWhileLoading()
+{
+    loadStates()[this].ownUnload = true;
+    unloadPlugins();
+    loadStates()[this].ownUnload = false;
+}
+
+void PluginContainer::loadDirectory(const QString &directory)
+{
     Q_EMIT nodeContainerAboutToBeReset();
 
     // The unload's own announcements are not seen: to listeners, a reload is
     // the one reset announced around it.
     const bool wasBlocked = blockSignals(true);
-    unloadPlugins();
+    unloadWhileLoading();
     blockSignals(wasBlocked);
 
     _pluginPath = directory;
@@ -107,17 +185,19 @@ void PluginContainer::loadPlugins(const QString &directory)
     // The platform's order: the files are not sorted.
     QDirIterator it(directory, QStringList{QStringLiteral("*.so")}, QDir::Files,
                     QDirIterator::Subdirectories);
+    const QPointer<PluginContainer> self(this);
     while (it.hasNext()) {
         it.next();
         QCoreApplication::processEvents();
-        loadPlugin(it.fileInfo().absoluteFilePath());
+        if (!self || !loadPlugin(it.fileInfo().absoluteFilePath()))
+            return;
     }
 
     _rootNode->loadTreeFromList(_modules);
     Q_EMIT nodeContainerReset(_rootNode);
 }
 
-void PluginContainer::loadPlugin(const QString &filePath)
+bool PluginContainer::loadPlugin(const QString &filePath)
 {
     auto *loader = new QPluginLoader(filePath, this);
     // 9: every symbol resolved at load time, so a plugin with a missing
@@ -127,7 +207,7 @@ void PluginContainer::loadPlugin(const QString &filePath)
     _plugins.append(PluginEntry(loader, nullptr));
 
     if (!loader->load())
-        return;
+        return true;
 
     QObject *instance = loader->instance();
     auto *plugin = qobject_cast<Plugin *>(instance);
@@ -142,7 +222,7 @@ void PluginContainer::loadPlugin(const QString &filePath)
     if (!refusal.isEmpty()) {
         loader->setProperty(refusalProperty, refusal);
         loader->unload();
-        return;
+        return true;
     }
 
     _plugins.last().second = plugin;
@@ -152,8 +232,11 @@ void PluginContainer::loadPlugin(const QString &filePath)
     const QList<QObject *> objects = plugin->modules();
     const RelayedSignals &relayed = relayedSignals();
     bool contributed = false;
+    const QPointer<PluginContainer> self(this);
     for (QObject *object : objects) {
         QCoreApplication::processEvents();
+        if (!self)
+            return false;
         auto *module = qobject_cast<Module *>(object);
         if (!module)
             continue;
@@ -166,10 +249,18 @@ void PluginContainer::loadPlugin(const QString &filePath)
     }
     if (contributed)
         _availableOperationsClass |= plugin->availableOperationsClass();
+    return true;
 }
 
 void PluginContainer::unloadPlugins()
 {
+    const auto state = loadStates().find(this);
+    if (state != loadStates().end() && !state->ownUnload) {
+        // The load under way walks the plugin list: the unload waits for it.
+        state->deferred = LoadState::Unload;
+        qCWarning(KVT_PLUGIN, "PluginContainer::unloadPlugins() called during a load: deferred until that load ends");
+        return;
+    }
     Q_EMIT nodeContainerAboutToBeReset();
 
     _availableOperationsClass = 0;

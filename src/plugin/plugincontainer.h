@@ -38,28 +38,37 @@ public:
     //! A file tried: its loader (owned) and the accepted plugin, or null.
     typedef QPair<QPluginLoader *, Plugin *> PluginEntry;
 
+    /*!
+     * Creates an empty container. When \a parent is a widget it becomes the parent
+     * of the container's message boxes and of the plugin dialog.
+     */
     explicit PluginContainer(QObject *parent = nullptr);
+    //! Unloads every plugin (see unloadPlugins()).
     ~PluginContainer() override;
 
     /*!
      * Unloads what is loaded and loads every plugin below \a directory.
      * Pending interface events are processed between files and between
-     * modules, so the window stays responsive; do not start another load
-     * from an event handler while one runs.
+     * modules, so the window stays responsive. A load or unload asked for by
+     * such an event waits: it runs when the current load has ended (of
+     * several, the last one asked for), and a warning is logged.
      *
      * A missing directory is reported in a message box and leaves the
      * container empty.
      */
     void loadPlugins(const QString &directory);
     /*! Detaches and destroys every plugin and module; the tree is empty
-     *  afterwards. */
+     *  afterwards. Asked for during a load, it waits until the load ends. */
     void unloadPlugins();
 
     /*! The union of the operation classes of the plugins that contributed
      *  at least one module. */
     quint64 availableOperationsClass() const { return _availableOperationsClass; }
+    //! The directory last given to loadPlugins(); empty after unloading.
     QString pluginPath() const { return _pluginPath; }
+    //! Every accepted module, in load order.
     QList<TreeNode *> modules() const { return _modules; }
+    //! The model of every file tried and of the modules of each plugin; owned by the container.
     PluginModel *pluginModel() const { return _pluginModel; }
 
     /*! Every file tried by the last load, in the order tried. */
@@ -70,23 +79,35 @@ public:
     QString pluginError(int index) const;
 
 public Q_SLOTS:
+    //! Shows the plugin dialog (window-modal).
     void showPluginDialog() const;
 
 Q_SIGNALS:
+    //! Relays Module::contentElementWidgetChanged() of every loaded module.
     void contentElementWidgetChanged(int state);
+    //! Relays Module::customContextMenuRequested() of every loaded module.
     void customContextMenuRequested(const QPoint &pos);
 
 protected:
+    //! See availableOperationsClass().
     quint64 _availableOperationsClass;
+    //! The constructor's parent when it is a widget, else null.
     QWidget *_parentWidget;
+    //! See pluginPath().
     QString _pluginPath;
+    //! See plugins().
     QList<PluginEntry> _plugins;
+    //! See modules().
     QList<TreeNode *> _modules;
+    //! See pluginModel().
     PluginModel *_pluginModel;
+    //! The plugin dialog, parented to the parent widget (deleted by the container without one).
     PluginDialog *_pluginDialog;
 
 private:
-    void loadPlugin(const QString &filePath);
+    void loadDirectory(const QString &directory);
+    bool loadPlugin(const QString &filePath);
+    void unloadWhileLoading();
 };
 
 #endif // KVT_PLUGINCONTAINER_H

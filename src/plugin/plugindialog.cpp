@@ -2,6 +2,7 @@
 #include "ui_plugindialog.h"
 
 #include "plugincontainer.h"
+#include "plugincontainer_p.h"
 #include "pluginmodel.h"
 #include "treenodemodel.h"
 
@@ -55,13 +56,14 @@ void PluginDialog::saveSettings() const
 
 void PluginDialog::changePath()
 {
-    if (!_pluginContainer)
+    // A load processes events: no second one starts from here meanwhile.
+    if (!_pluginContainer || KvtPluginLoading::isLoading(_pluginContainer))
         return;
     const QString current = _pluginContainer->pluginPath();
     const QString directory = QFileDialog::getExistingDirectory(
         this, tr("Plugin directory"), current, QFileDialog::ShowDirsOnly);
     // The container may have gone while the file dialog was open.
-    if (directory.isEmpty() || !_pluginContainer)
+    if (directory.isEmpty() || !_pluginContainer || KvtPluginLoading::isLoading(_pluginContainer))
         return;
     // "/usr/lib/x/" and "/usr/lib/x" are one directory: no reload for it.
     if (!current.isEmpty() && QDir::cleanPath(directory) == QDir::cleanPath(current))

@@ -23,10 +23,14 @@ class KVTCOMMON_EXPORT PluginDialog : public QDialog
     Q_OBJECT
 
 public:
+    //! Creates the dialog for \a container and restores its geometry. The container is not owned.
     explicit PluginDialog(PluginContainer *container, QWidget *parent = nullptr);
+    //! Saves the geometry.
     ~PluginDialog() override;
 
+    //! Restores the geometry from "pluginDialog/pluginDialogGeometry" when stored.
     void loadSettings();
+    //! Stores the geometry under "pluginDialog/pluginDialogGeometry".
     void saveSettings() const;
 
 public Q_SLOTS:
@@ -35,6 +39,7 @@ public Q_SLOTS:
     void changePath();
 
 protected:
+    //! Shows the container's current plugin directory.
     void showEvent(QShowEvent *event) override;
 
 private Q_SLOTS:

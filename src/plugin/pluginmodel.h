@@ -23,14 +23,26 @@ class KVTCOMMON_EXPORT PluginModel : public QAbstractItemModel
     Q_OBJECT
 
 public:
+    //! Creates the model of \a container (not owned), following its loads and unloads.
     explicit PluginModel(PluginContainer *container, QObject *parent = nullptr);
+    //! Destroys the model.
     ~PluginModel() override;
 
+    //! The index of \a row and \a column under \a parent; invalid when out of range.
     QModelIndex index(int row, int column, const QModelIndex &parent = QModelIndex()) const override;
+    //! The file row of a module row; invalid for a file row.
     QModelIndex parent(const QModelIndex &index) const override;
+    //! Every file tried at the top; the modules of an accepted plugin below it.
     int rowCount(const QModelIndex &parent = QModelIndex()) const override;
+    //! Two columns, "Name" and "Description".
     int columnCount(const QModelIndex &parent = QModelIndex()) const override;
+    /*!
+     * Name (with a "task-complete" or "task-reject" icon and the file name as tool
+     * tip) and description of a file, or id and description of a module. A refused
+     * file shows its file name and why it was refused.
+     */
     QVariant data(const QModelIndex &index, int role = Qt::DisplayRole) const override;
+    //! The translated "Name" and "Description".
     QVariant headerData(int section, Qt::Orientation orientation,
                         int role = Qt::DisplayRole) const override;
 
@@ -43,7 +55,9 @@ public:
     QModelIndex ObjectToIndex(QObject *object) const;
 
 public Q_SLOTS:
+    //! Begins the model reset of a load or unload.
     void pluginContainerAboutToBeReset();
+    //! Ends the model reset of a load or unload.
     void pluginContainerReset();
 
 private:

@@ -19,19 +19,33 @@ class KVTCOMMON_EXPORT SupplementModule : public Module
     Q_OBJECT
 
 public:
+    /*!
+     * Creates the module \a name, hung by the tree loader at \a expectedDepth under
+     * the module whose id is \a expectedParentId, with \a description in its module
+     * data. Insertions of elements of \a elementType are passed on to \a donor (not
+     * owned).
+     */
     SupplementModule(const QString &name, int expectedDepth, const QString &expectedParentId,
                      const QString &description, const QString &elementType, Module *donor,
                      QObject *parent = nullptr);
+    //! Destroys the module.
     ~SupplementModule() override;
 
+    /*!
+     * Passes InsertedOperation of an element of supplementElementType() on to the donor; ignores the rest.
+     */
     void performOperation(ContextOperation *context, OperationType type, ElementData *data,
                           int flags) override;
 
+    //! The module told about insertions; not owned.
     Module *donorModule() const { return _donorModule; }
+    //! The element type whose insertions are passed on.
     QString supplementElementType() const { return _supplementElementType; }
 
 protected:
+    //! See donorModule().
     Module *_donorModule;
+    //! See supplementElementType().
     QString _supplementElementType;
 };
 

@@ -23,8 +23,11 @@ class KVTCOMMON_EXPORT AppException : public QException
 public:
     // The default argument only serves the meta-type system, which needs a
     // default-constructible type to queue the exception through a signal.
+    //! Creates an exception with the message \a text (already translated).
     explicit AppException(const QString &text = QString());
+    //! Copies the message.
     AppException(const AppException &other);
+    //! Copies the message.
     AppException &operator=(const AppException &other);
     ~AppException() noexcept override;
 
@@ -34,6 +37,7 @@ public:
      */
     const char *what() const noexcept override;
 
+    //! The message.
     const QString &getText() const { return _text; }
 
 private:

@@ -17,9 +17,11 @@ class KVTCOMMON_EXPORT Package : public QObject
     Q_OBJECT
 
 public:
+    //! Creates the query of the package (or package pattern) \a name; nothing runs yet.
     explicit Package(const QString &name);
     ~Package() override;
 
+    //! The package name or pattern.
     QString name() const { return _name; }
 
     /*!

@@ -21,6 +21,7 @@ class KVTCOMMON_EXPORT PgsqlCluster : public QObject
     Q_OBJECT
 
 public:
+    //! Creates an empty cluster description; use fromString() to read one.
     explicit PgsqlCluster(QObject *parent = nullptr);
     ~PgsqlCluster() override;
 
@@ -31,16 +32,24 @@ public:
      */
     static PgsqlCluster *fromString(const QString &line);
 
+    //! The server version, for instance "15".
     QString version() const { return _version; }
+    //! The cluster name, for instance "main".
     QString name() const { return _name; }
+    //! The TCP port.
     int port() const { return _port; }
+    //! The status pg_lsclusters reported ("online", "down", ...).
     QString status() const { return _status; }
+    //! The system user owning the cluster.
     QString owner() const { return _owner; }
+    //! The data directory.
     QString dataDirectory() const { return _dataDirectory; }
+    //! The log file.
     QString logFile() const { return _logFile; }
 
     //! Whether the cluster runs ("pg_ctlcluster <version> <name> status" exits 0).
     bool isWork() const;
+    //! Starts the cluster with pg_ctlcluster; throws AppException on failure.
     void start() const;
 
     /*!
@@ -50,6 +59,7 @@ public:
      */
     QString sqlRequest(const QString &query) const;
 
+    //! The names of the cluster's database users (roles).
     QStringList usernames() const;
 
     /*!
@@ -60,6 +70,7 @@ public:
      * exactly as written when they are not quoted.
      */
     void createUser(const QString &name) const;
+    //! Drops the database user \a name when it exists; see createUser() for the names accepted.
     void deleteUser(const QString &name) const;
 
 private:

@@ -21,6 +21,7 @@ class KVTCOMMON_EXPORT PgsqlManager : public QObject
     Q_OBJECT
 
 public:
+    //! Creates a manager with no clusters read.
     explicit PgsqlManager(QObject *parent = nullptr);
     ~PgsqlManager() override;
 
@@ -33,6 +34,7 @@ public:
      */
     void readClusters();
 
+    //! The clusters of the last read, owned by the manager.
     QList<PgsqlCluster *> getClusters() const { return _clusters; }
 
     //! True when every cluster runs, and for an empty list.

@@ -28,16 +28,20 @@ class KVTCOMMON_EXPORT PgsqlManagerAsync : public QObject
     Q_OBJECT
 
 public:
+    //! Creates the reader; nothing is read yet.
     explicit PgsqlManagerAsync(QObject *parent = nullptr);
     ~PgsqlManagerAsync() override;
 
+    //! Starts a read on the global thread pool; returns at once.
     void startReadClusters();
     //! The body of a read, run on a pool thread.
     void performReadClusters();
 
 Q_SIGNALS:
     // The spelling of the name is kept: receivers connect to it by name.
+    //! A read ended; \a clusters belong to this object until the next read.
     void clustersReaded(const QList<PgsqlCluster *> &clusters);
+    //! A read failed with \a exception; emitted from the pool thread.
     void exceptionArise(const AppException &exception);
 
 private Q_SLOTS:

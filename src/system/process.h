@@ -20,6 +20,7 @@ class KVTCOMMON_EXPORT Process : public QProcess
     Q_OBJECT
 
 public:
+    //! Creates the process object; nothing runs yet.
     explicit Process(QObject *parent = nullptr);
     ~Process() override;
 

@@ -30,6 +30,9 @@
 class KVTCOMMON_EXPORT RegExpHandler
 {
 public:
+    /*!
+     * Creates the handler of the regular expression \a pattern (case-sensitive, QRegExp::RegExp syntax).
+     */
     explicit RegExpHandler(const QString &pattern);
     virtual ~RegExpHandler();
 
@@ -55,9 +58,18 @@ public:
      * afresh for every line, so a subclass may change it between lines.
      */
     QRegExp &regExp() { return _regExp; }
+    //! The expression, holding the captures of the last match.
     const QRegExp &regExp() const { return _regExp; }
 
+    /*!
+     * Reads \a fileName and calls handleRegExp(nullptr) for every matching line.
+     * Returns false and extends \a error when the file is missing or unreadable.
+     */
     static bool readSystemConfigureFile(const QString &fileName, RegExpHandler &handler, QString &error);
+    /*!
+     * Rewrites \a fileName through the handler, keeping a backup "<file>.bak" when
+     * \a backup is true. Returns false and extends \a error on any failure.
+     */
     static bool rewriteSystemConfigureFile(const QString &fileName, RegExpHandler &handler, QString &error,
                                            bool backup);
 

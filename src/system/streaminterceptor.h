@@ -26,6 +26,7 @@
 class KVTCOMMON_EXPORT StreamInterceptor : public QTemporaryFile
 {
 public:
+    //! Starts capturing \a stream (stdout or stderr); the stream is flushed first.
     explicit StreamInterceptor(FILE *stream);
     ~StreamInterceptor() override;
 

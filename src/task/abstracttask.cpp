@@ -2,9 +2,6 @@
 
 #include "elementdata.h"
 #include "taskobserver.h"
-#include "taskperformedevent.h"
-
-#include <QCoreApplication>
 
 AbstractTask::AbstractTask(ElementData *data)
     : _taskSpecialFlags(0)
@@ -15,12 +12,17 @@ AbstractTask::AbstractTask(ElementData *data)
 
 AbstractTask::~AbstractTask()
 {
+    // First, while the flags are still there: a row of the observer may be
+    // reading them from the interface thread.
+    TaskObserver::taskDestroyed(this);
     delete _elementData;
 }
 
 void AbstractTask::run()
 {
-    QCoreApplication::postEvent(TaskObserver::instance(), new TaskPerformedEvent(this));
+    // Posts a TaskPerformedEvent to the observer; see postCompletion for the
+    // case of a worker that finds no observer.
+    TaskObserver::postCompletion(this);
 }
 
 bool AbstractTask::setTaskAboutToBeStopped()

@@ -18,6 +18,7 @@ class KVTCOMMON_EXPORT BlockDialog : public QDialog
     Q_OBJECT
 
 public:
+    //! Creates the modal dialog; it deletes itself when closed.
     explicit BlockDialog(QWidget *parent = nullptr);
 };
 

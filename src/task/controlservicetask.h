@@ -18,20 +18,33 @@ class KVTCOMMON_EXPORT ControlServiceTask : public ElementTask
     Q_DECLARE_TR_FUNCTIONS(ControlServiceTask)
 
 public:
+    //! Creates a task for \a element; set the program, arguments and user before starting it.
     explicit ControlServiceTask(Element *element);
+    //! Destroys the task.
     ~ControlServiceTask() override;
 
+    /*!
+     * Launches the program detached and succeeds once it is launched; fails with a message otherwise.
+     */
     void run() override;
+    //! Does nothing: the outcome of the detached program is not known.
     void afterRun() override;
 
+    //! The user to run as; empty means the current user.
     const QString &user() const { return _user; }
+    //! Runs the program as \a user through "runuser -u" (needs administrator rights).
     void setUser(const QString &user) { _user = user; }
     /*! A string the creator keeps with the task; the library never reads it. */
     const QString &extra() const { return _extra; }
+    //! Sets the string kept with the task.
     void setExtra(const QString &extra) { _extra = extra; }
+    //! The program to launch.
     const QString &program() const { return _program; }
+    //! Sets the program to launch.
     void setProgram(const QString &program) { _program = program; }
+    //! The program's arguments.
     const QStringList &arguments() const { return _arguments; }
+    //! Sets the program's arguments.
     void setArguments(const QStringList &arguments) { _arguments = arguments; }
 
     /*! Whether the package \a name is installed: dpkg-query lists it with the
@@ -40,9 +53,13 @@ public:
     static bool existPackage(const QString &name);
 
 protected:
+    //! See user().
     QString _user;
+    //! See extra().
     QString _extra;
+    //! See program().
     QString _program;
+    //! See arguments().
     QStringList _arguments;
 };
 

@@ -15,7 +15,11 @@
 class KVTCOMMON_EXPORT CreateTask : public ElementTask
 {
 public:
+    /*!
+     * Creates the task for the container \a element with the record of the new element (owned); the record's "name" names the element to select after a re-read.
+     */
     CreateTask(Element *element, ElementData *data);
+    //! Destroys the task and its record.
     ~CreateTask() override;
 
     void afterRun() override;

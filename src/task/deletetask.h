@@ -14,7 +14,9 @@
 class KVTCOMMON_EXPORT DeleteTask : public ElementTask
 {
 public:
+    //! Creates the task without a record.
     DeleteTask(Element *element);
+    //! Destroys the task and its record; the element only in the case described above.
     ~DeleteTask() override;
 
     void afterRun() override;

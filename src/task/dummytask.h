@@ -14,13 +14,18 @@ class KVTCOMMON_EXPORT DummyTask : public ElementTask
     Q_DECLARE_TR_FUNCTIONS(DummyTask)
 
 public:
+    //! Creates a task named "Dummy task" that succeeds when \a success is true and fails otherwise.
     DummyTask(Element *element, bool success);
+    //! Destroys the task.
     ~DummyTask() override;
 
+    //! Sleeps five seconds, then sets the status (and an error message on failure).
     void run() override;
+    //! Does nothing.
     void afterRun() override;
 
 protected:
+    //! Whether the task is to succeed.
     bool _success;
 };
 

@@ -7,17 +7,22 @@ class ElementWidget;
 
 /*!
  * A task that works for one element widget (import, export, print). The
- * widget is not owned; it must outlive the task.
+ * widget is not owned; it must outlive the task, which keeps a plain pointer
+ * and would reach freed memory in afterRun() if the widget went first.
  */
 class KVTCOMMON_EXPORT ElementWidgetTask : public AbstractTask
 {
 public:
+    //! Creates a task for \a widget, owning \a data. run() must not use the widget.
     ElementWidgetTask(ElementWidget *widget, ElementData *data = nullptr);
+    //! Destroys the task and its record, not the widget.
     ~ElementWidgetTask() override;
 
+    //! The widget the task works for; use it in afterRun() only.
     ElementWidget *elementWidget() const { return _elementWidget; }
 
 protected:
+    //! See elementWidget(); not owned.
     ElementWidget *_elementWidget;
 };
 

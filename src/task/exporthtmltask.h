@@ -15,10 +15,16 @@ class KVTCOMMON_EXPORT ExportHtmlTask : public AbstractTask
     Q_DECLARE_TR_FUNCTIONS(ExportHtmlTask)
 
 public:
+    /*!
+     * Creates the task with \a data (owned) holding "htmlText" and "filePath"; its name is "Export to HTML".
+     */
     explicit ExportHtmlTask(ElementData *data);
+    //! Destroys the task and its record.
     ~ExportHtmlTask() override;
 
+    //! Writes the file in the worker thread.
     void run() override;
+    //! Does nothing.
     void afterRun() override;
 };
 

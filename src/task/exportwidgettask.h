@@ -14,7 +14,9 @@ class KVTCOMMON_EXPORT ExportWidgetTask : public ElementWidgetTask
     Q_DECLARE_TR_FUNCTIONS(ExportWidgetTask)
 
 public:
+    //! Creates the task with the content to export in \a data (owned).
     ExportWidgetTask(ElementWidget *widget, ElementData *data);
+    //! Destroys the task and its record.
     ~ExportWidgetTask() override;
 
     void afterRun() override;

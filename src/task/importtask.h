@@ -11,7 +11,9 @@
 class KVTCOMMON_EXPORT ImportTask : public ElementWidgetTask
 {
 public:
+    //! Creates the task with \a data (owned), which run() fills with the imported content.
     ImportTask(ElementWidget *widget, ElementData *data);
+    //! Destroys the task and its record.
     ~ImportTask() override;
 
     void afterRun() override;

@@ -18,10 +18,14 @@ class KVTCOMMON_EXPORT PrintWidgetTask : public ElementWidgetTask
     Q_DECLARE_TR_FUNCTIONS(PrintWidgetTask)
 
 public:
+    //! Creates the task with \a data (owned) holding "xmlText" and "templateName".
     PrintWidgetTask(ElementWidget *widget, ElementData *data);
+    //! Destroys the task and its record.
     ~PrintWidgetTask() override;
 
+    //! Applies the stylesheet in the worker thread; a failed transformation fails the task.
     void run() override;
+    //! Shows the HTML in the print preview after a successful run.
     void afterRun() override;
 };
 

@@ -11,7 +11,11 @@
 class KVTCOMMON_EXPORT ReadPropertyHeavyTask : public ElementTask
 {
 public:
+    /*!
+     * Creates the task without a record: run() must create one (an ElementData the task then owns) and fill it, or the edit widget receives null.
+     */
     ReadPropertyHeavyTask(Element *element);
+    //! Destroys the task and its record.
     ~ReadPropertyHeavyTask() override;
 
     void afterRun() override;

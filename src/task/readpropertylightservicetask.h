@@ -10,7 +10,11 @@
 class KVTCOMMON_EXPORT ReadPropertyLightServiceTask : public ServiceTask
 {
 public:
+    /*!
+     * Creates a status query of the service of \a element, with a ServiceLightElementData record of its own.
+     */
     explicit ReadPropertyLightServiceTask(Element *element);
+    //! Destroys the task and its record.
     ~ReadPropertyLightServiceTask() override;
 
     void afterRun() override;

@@ -7,6 +7,7 @@
 class KVTCOMMON_EXPORT ReloadServiceTask : public RServiceTask
 {
 public:
+    //! Creates a "reload" task for the service of \a element.
     explicit ReloadServiceTask(Element *element);
     ~ReloadServiceTask() override;
 };

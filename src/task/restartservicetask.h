@@ -7,6 +7,7 @@
 class KVTCOMMON_EXPORT RestartServiceTask : public RServiceTask
 {
 public:
+    //! Creates a "restart" task for the service of \a element.
     explicit RestartServiceTask(Element *element);
     ~RestartServiceTask() override;
 };

@@ -11,7 +11,9 @@
 class KVTCOMMON_EXPORT RServiceTask : public ServiceTask
 {
 public:
+    //! Creates a task for the service of \a element.
     explicit RServiceTask(Element *element);
+    //! Destroys the task.
     ~RServiceTask() override;
 
     void afterRun() override;

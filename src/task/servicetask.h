@@ -26,17 +26,31 @@ class KVTCOMMON_EXPORT ServiceTask : public ElementTask
     Q_DECLARE_TR_FUNCTIONS(ServiceTask)
 
 public:
+    //! Creates a task for \a element owning \a data; program and arguments start empty.
     ServiceTask(Element *element, ElementData *data = nullptr);
+    //! Destroys the task and its record.
     ~ServiceTask() override;
 
+    /*!
+     * Runs program() with commandLine() in the worker thread (waiting up to 30
+     * seconds for it to start), sets the status and message as described above and
+     * posts the completion.
+     */
     void run() override;
 
+    //! Whether the command word goes before the arguments (the default).
     bool commandFirst() const { return _commandFirst; }
+    //! Puts the command word before (true) or after (false) the arguments.
     void setCommandFirst(bool first) { _commandFirst = first; }
+    //! The control program to run; the creator sets it.
     const QString &program() const { return _program; }
+    //! Sets the control program, for instance "/usr/sbin/service".
     void setProgram(const QString &program) { _program = program; }
+    //! The command word fixed by the subclass ("status", "start", ...).
     const QString &command() const { return _command; }
+    //! Further arguments, typically the service's name.
     const QStringList &arguments() const { return _arguments; }
+    //! Sets the further arguments.
     void setArguments(const QStringList &arguments) { _arguments = arguments; }
 
     /*! The arguments the program is started with: the command word and the
@@ -44,9 +58,13 @@ public:
     QStringList commandLine() const;
 
 protected:
+    //! See commandFirst().
     bool _commandFirst;
+    //! See program().
     QString _program;
+    //! See command(); a subclass sets it in its constructor.
     QString _command;
+    //! See arguments().
     QStringList _arguments;
 };
 

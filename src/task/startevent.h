@@ -13,11 +13,15 @@
 class KVTCOMMON_EXPORT StartEvent : public QEvent
 {
 public:
+    //! The event type, 1001.
     static const QEvent::Type EventType = QEvent::Type(1001);
 
+    //! Creates the event for \a pluginPath.
     explicit StartEvent(const QString &pluginPath);
+    //! Destroys the event.
     ~StartEvent() override;
 
+    //! The plugin path given to the constructor.
     QString pluginPath() const { return _pluginPath; }
 
 private:

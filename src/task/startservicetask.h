@@ -7,6 +7,7 @@
 class KVTCOMMON_EXPORT StartServiceTask : public StartStopServiceTask
 {
 public:
+    //! Creates a "start" task for the service of \a element.
     explicit StartServiceTask(Element *element);
     ~StartServiceTask() override;
 };

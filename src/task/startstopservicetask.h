@@ -13,14 +13,18 @@
 class KVTCOMMON_EXPORT StartStopServiceTask : public ServiceTask
 {
 public:
+    //! Creates a task that starts (\a start true) or stops the service of \a element.
     StartStopServiceTask(Element *element, bool start);
+    //! Destroys the task.
     ~StartStopServiceTask() override;
 
     void afterRun() override;
 
+    //! The wanted state: true to start, false to stop.
     bool start() const { return _start; }
 
 protected:
+    //! See start().
     bool _start;
 };
 

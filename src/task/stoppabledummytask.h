@@ -14,10 +14,16 @@ class KVTCOMMON_EXPORT StoppableDummyTask : public ElementTask
     Q_DECLARE_TR_FUNCTIONS(StoppableDummyTask)
 
 public:
+    //! Creates the stoppable task "Stoppable dummy task".
     StoppableDummyTask(Element *element);
+    //! Destroys the task.
     ~StoppableDummyTask() override;
 
+    /*!
+     * Sleeps up to ten times five seconds; a stop request ends it after the current sleep with "Terminate by user".
+     */
     void run() override;
+    //! Does nothing.
     void afterRun() override;
 };
 

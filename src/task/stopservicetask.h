@@ -7,6 +7,7 @@
 class KVTCOMMON_EXPORT StopServiceTask : public StartStopServiceTask
 {
 public:
+    //! Creates a "stop" task for the service of \a element.
     explicit StopServiceTask(Element *element);
     ~StopServiceTask() override;
 };

@@ -2,22 +2,132 @@
 
 #include "abstracttask.h"
 #include "blockdialog.h"
+#include "handover_p.h"
 #include "taskobserverdialog.h"
 #include "taskobservermodel.h"
 #include "taskperformedevent.h"
 #include "thread.h"
 #include "kvtlogging_p.h"
 
+#include <QCoreApplication>
+#include <QMutex>
+#include <QSet>
+#include <QThread>
 #include <QTimer>
 #include <QWidget>
 
 TaskObserver *TaskObserver::_instance = nullptr;
 
+namespace {
+
+// What workers share with the observer. _instance is written only by the
+// interface thread, under this lock, so that a worker never posts to an
+// observer being destroyed. The tasks that have a row and still exist are
+// listed here too: a stopping worker deletes the tasks still queued, in its
+// own thread, and the rows must not reach them afterwards.
+struct SharedState
+{
+    QMutex mutex;
+    QSet<const AbstractTask *> listed;     // alive, with a row in the observer
+    QList<const AbstractTask *> droppedListed; // destroyed while listed, row not settled yet
+};
+
+SharedState &shared()
+{
+    static SharedState state;
+    return state;
+}
+
+// The observer whose destructor is handing out the completions still queued.
+const TaskObserver *dyingObserver = nullptr;
+
+// Addresses that mark the queued calls made by workers (see handover_p.h).
+const char completionRelay = 0;
+const char settleRequest = 0;
+
+bool inInterfaceThread()
+{
+    const QCoreApplication *app = QCoreApplication::instance();
+    return !app || QThread::currentThread() == app->thread();
+}
+
+bool isFinalStatus(TaskDescription::TaskStatus status)
+{
+    return status == TaskDescription::Fail || status == TaskDescription::Success
+        || status == TaskDescription::Warning;
+}
+
+} // namespace
+
 TaskObserver *TaskObserver::instance(QObject *parent)
 {
-    if (!_instance)
-        _instance = new TaskObserver(parent);
+    // Only the interface thread creates or destroys the observer, so it reads
+    // _instance without the lock; other threads take it.
+    if (inInterfaceThread()) {
+        if (!_instance) {
+            TaskObserver *observer = new TaskObserver(parent);
+            QMutexLocker locker(&shared().mutex);
+            _instance = observer;
+        }
+        return _instance;
+    }
+    QMutexLocker locker(&shared().mutex);
+    if (!_instance) {
+        // Made here, the observer and its dialogs would live in a worker that
+        // has no event loop: completions would never arrive.
+        qCWarning(KVT_TASK, "TaskObserver::instance(): no observer exists and it cannot be created outside the interface thread");
+    }
     return _instance;
+}
+
+void TaskObserver::postCompletion(AbstractTask *task)
+{
+    {
+        QMutexLocker locker(&shared().mutex);
+        if (_instance) {
+            auto *event = new TaskPerformedEvent(task);
+            KvtHandOver::handOver(event);
+            QCoreApplication::postEvent(_instance, event);
+            return;
+        }
+    }
+    // No observer: the task was queued before one was made, or the observer
+    // was destroyed while the task ran. The completion goes to the interface
+    // thread, which makes the observer there and hands it the task.
+    QCoreApplication *app = QCoreApplication::instance();
+    if (!app) {
+        qCWarning(KVT_TASK, "task \"%s\" finished without an application object: its completion cannot be delivered",
+                  qPrintable(task->taskDescription().description()));
+        return;
+    }
+    if (inInterfaceThread()) {
+        QCoreApplication::postEvent(instance(), new TaskPerformedEvent(task));
+        return;
+    }
+    KvtHandOver::handOver(&completionRelay);
+    QMetaObject::invokeMethod(app, [task] {
+        KvtHandOver::takeOver(&completionRelay);
+        QCoreApplication::postEvent(TaskObserver::instance(), new TaskPerformedEvent(task));
+    }, Qt::QueuedConnection);
+}
+
+void TaskObserver::taskDestroyed(AbstractTask *task)
+{
+    QMutexLocker locker(&shared().mutex);
+    if (!shared().listed.remove(task))
+        return;
+    // Destroyed while its row still points at it: dropped by a stopping
+    // worker (or deleted by its owner against the rules). The row is settled
+    // in the interface thread.
+    shared().droppedListed.append(task);
+    if (_instance) {
+        TaskObserver *observer = _instance;
+        KvtHandOver::handOver(&settleRequest);
+        QMetaObject::invokeMethod(observer, [observer] {
+            KvtHandOver::takeOver(&settleRequest);
+            observer->settleDroppedTasks();
+        }, Qt::QueuedConnection);
+    }
 }
 
 TaskObserver::TaskObserver(QObject *parent)
@@ -39,14 +149,30 @@ TaskObserver::TaskObserver(QObject *parent)
 
 TaskObserver::~TaskObserver()
 {
+    {
+        QMutexLocker locker(&shared().mutex);
+        if (_instance == this)
+            _instance = nullptr;
+        // Tasks still running report to the next observer; their rows go
+        // with this one.
+        for (auto it = _taskRows.cbegin(); it != _taskRows.cend(); ++it)
+            shared().listed.remove(it.key());
+        shared().droppedListed.clear();
+    }
+    // Completions already posted here would be discarded with this object,
+    // and their tasks never finished nor freed: finish them now, quietly.
+    dyingObserver = this;
+    QCoreApplication::sendPostedEvents(this, TaskPerformedEvent::EventType);
+    dyingObserver = nullptr;
     delete _blockDialog;
     delete _dialog;
-    if (_instance == this)
-        _instance = nullptr;
 }
 
 void TaskObserver::performTask(AbstractTask *task)
 {
+    // A task may be new at the address of one that a stopping worker dropped:
+    // the old row lets go of that address first.
+    settleDroppedTasks();
     if (!task || _taskRows.contains(task) || task->taskAboutToBeStopped())
         return;
 
@@ -67,6 +193,10 @@ void TaskObserver::performTask(AbstractTask *task)
     ++_runningCount;
     _taskRows.insert(task, row);
     _rows.append(Row{task->taskDescription(), task});
+    {
+        QMutexLocker locker(&shared().mutex);
+        shared().listed.insert(task);
+    }
     Q_EMIT tasksInserted(row, row);
 
     if (!Thread::put(task)) {
@@ -77,7 +207,7 @@ void TaskObserver::performTask(AbstractTask *task)
                  qPrintable(task->taskDescription().description()));
         task->taskDescription().setStatus(TaskDescription::Fail);
         task->taskDescription().setMessage(tr("The task was not started: no worker thread is free."));
-        recordOutcome(task);
+        recordOutcome(task, task->taskDescription());
         forgetTask(task);
         delete task;
     }
@@ -88,7 +218,25 @@ void TaskObserver::taskPerformedEvent(TaskPerformedEvent *event)
     if (!event || !event->task())
         return;
     AbstractTask *task = event->task();
-    recordOutcome(task);
+    if (dyingObserver == this) {
+        // The observer is going away: the task is finished without a row.
+        task->afterRun();
+        delete task;
+        return;
+    }
+    TaskDescription outcome = task->taskDescription();
+    if (!isFinalStatus(outcome.status())) {
+        // A run() that ends without fail, success or warning would keep the
+        // list "running" for ever. It counts as a warning, so that the user
+        // sees it and the list can still close.
+        qCWarning(KVT_TASK, "task \"%s\" finished with the status %d instead of fail, success or warning; "
+                            "its run() must set a final status before calling AbstractTask::run()",
+                  qPrintable(outcome.description()), int(outcome.status()));
+        outcome.setStatus(TaskDescription::Warning);
+        if (outcome.message().isEmpty())
+            outcome.setMessage(tr("The task finished without reporting its outcome."));
+    }
+    recordOutcome(task, outcome);
     // A task is deleted right below, so its row forgets it now: a pointer to
     // a deleted task could be taken for a new task created at the same
     // address, which would then be refused as already listed.
@@ -97,13 +245,13 @@ void TaskObserver::taskPerformedEvent(TaskPerformedEvent *event)
     delete task;
 }
 
-void TaskObserver::recordOutcome(AbstractTask *task)
+void TaskObserver::recordOutcome(AbstractTask *task, const TaskDescription &outcome)
 {
     const int row = _taskRows.value(task, -1);
     if (row >= 0 && row < _rows.size()) {
-        _rows[row].description = task->taskDescription();
+        _rows[row].description = outcome;
         Q_EMIT taskDataChanged(row);
-        switch (task->taskDescription().status()) {
+        switch (outcome.status()) {
         case TaskDescription::Success:
             --_runningCount;
             break;
@@ -143,6 +291,39 @@ void TaskObserver::forgetTask(AbstractTask *task)
     if (*it >= 0 && *it < _rows.size())
         _rows[*it].task = nullptr;
     _taskRows.erase(it);
+    QMutexLocker locker(&shared().mutex);
+    shared().listed.remove(task);
+}
+
+void TaskObserver::settleDroppedTasks()
+{
+    QList<const AbstractTask *> dropped;
+    {
+        QMutexLocker locker(&shared().mutex);
+        dropped.swap(shared().droppedListed);
+    }
+    for (const AbstractTask *gone : qAsConst(dropped)) {
+        // Only the address is used: the task no longer exists.
+        auto *task = const_cast<AbstractTask *>(gone);
+        const int row = _taskRows.value(task, -1);
+        if (row < 0 || row >= _rows.size())
+            continue;
+        _rows[row].task = nullptr;
+        TaskDescription outcome = _rows.at(row).description;
+        outcome.setStatus(TaskDescription::Fail);
+        outcome.setMessage(tr("The task was dropped without running: the worker threads were stopped."));
+        recordOutcome(task, outcome);
+        forgetTask(task);
+    }
+}
+
+quint64 TaskObserver::rowTaskSpecialFlags(int row) const
+{
+    if (row < 0 || row >= _rows.size() || !_rows.at(row).task)
+        return 0;
+    const AbstractTask *task = _rows.at(row).task;
+    QMutexLocker locker(&shared().mutex);
+    return shared().listed.contains(task) ? task->taskSpecialFlags() : 0;
 }
 
 bool TaskObserver::requestStop(int row)
@@ -151,6 +332,10 @@ bool TaskObserver::requestStop(int row)
         return false;
     Row &entry = _rows[row];
     if (entry.description.status() != TaskDescription::Processing || !entry.task)
+        return false;
+    // Held while the task is asked: a stopping worker cannot delete it meanwhile.
+    QMutexLocker locker(&shared().mutex);
+    if (!shared().listed.contains(entry.task))
         return false;
     if (!(entry.task->taskSpecialFlags() & AbstractTask::StoppableFlag)
         || entry.task->taskAboutToBeStopped() || !entry.task->setTaskAboutToBeStopped())
@@ -162,6 +347,7 @@ bool TaskObserver::requestStop(int row)
 bool TaskObserver::event(QEvent *event)
 {
     if (event->type() == TaskPerformedEvent::EventType) {
+        KvtHandOver::takeOver(event);
         taskPerformedEvent(static_cast<TaskPerformedEvent *>(event));
         event->accept();
         return true;
@@ -181,6 +367,11 @@ void TaskObserver::clearTasks()
     Q_EMIT tasksAboutToBeRemoved(count, count);
     _runningCount = 0;
     _problemCount = 0;
+    {
+        QMutexLocker locker(&shared().mutex);
+        for (auto it = _taskRows.cbegin(); it != _taskRows.cend(); ++it)
+            shared().listed.remove(it.key());
+    }
     _taskRows.clear();
     _rows.clear();
     Q_EMIT tasksRemoved(count, count);

@@ -109,7 +109,7 @@ QVariant TaskObserverModel::data(const QModelIndex &index, int role) const
         if (role == Qt::EditRole)
             return int(row.description.status());
         if (role == Qt::UserRole)
-            return QVariant::fromValue<quint64>(row.task ? row.task->taskSpecialFlags() : 0);
+            return QVariant::fromValue<quint64>(_observer->rowTaskSpecialFlags(index.row()));
         break;
     case 2:
         if (text)

@@ -14,11 +14,15 @@ class AbstractTask;
 class KVTCOMMON_EXPORT TaskPerformedEvent : public QEvent
 {
 public:
+    //! The event type, 1002.
     static const QEvent::Type EventType = QEvent::Type(1002);
 
+    //! Creates the completion event of \a task.
     explicit TaskPerformedEvent(AbstractTask *task);
+    //! Destroys the event, not the task.
     ~TaskPerformedEvent() override;
 
+    //! The task that has run.
     AbstractTask *task() const { return _task; }
 
 private:

@@ -2,6 +2,8 @@
 
 #include "abstracttask.h"
 
+#include <QList>
+
 AbstractTask *Thread::_buffer[Thread::BufferSize] = {};
 int Thread::_frontBound = 0;
 int Thread::_rearBound = 0;
@@ -19,7 +21,12 @@ Thread::Thread(QObject *parent)
 
 Thread::~Thread()
 {
-    _stopThread.store(true);
+    {
+        // Under the ring's lock, so that a put() either lands before the stop
+        // (and is dropped by the stop walk) or sees it and refuses the task.
+        QMutexLocker locker(&_frontBoundMutex);
+        _stopThread.store(true);
+    }
     _fullBuffer.release(1);
     wait();
 }
@@ -28,10 +35,19 @@ bool Thread::put(AbstractTask *task)
 {
     if (!task)
         return false;
-    if (!_emptyBuffer.tryAcquire(1))
-        return false;
-    _buffer[_rearBound] = task;
-    _rearBound = (_rearBound + 1) % BufferSize;
+    {
+        // The lock orders the store with the stop walk of the first worker,
+        // which reads and clears the same slots.
+        QMutexLocker locker(&_frontBoundMutex);
+        // Once stopped, no worker takes anything out of the ring again: a
+        // task accepted now would never run and never be freed.
+        if (_stopThread.load())
+            return false;
+        if (!_emptyBuffer.tryAcquire(1))
+            return false;
+        _buffer[_rearBound] = task;
+        _rearBound = (_rearBound + 1) % BufferSize;
+    }
     _fullBuffer.release(1);
     return true;
 }
@@ -61,10 +77,12 @@ void Thread::takeFilledSlot()
 
 void Thread::run()
 {
+    int index = -1;
     {
         QMutexLocker locker(&_frontBoundMutex);
-        _threadIndex = _threadsCount.fetchAndAddOrdered(1);
-        if (_threadIndex == 0) {
+        index = _threadsCount.fetchAndAddOrdered(1);
+        _threadIndex.store(index, std::memory_order_release);
+        if (index == 0) {
             // The first worker opens the ring: until now no slot was free, so
             // tasks put before any worker started were refused.
             for (AbstractTask *&slot : _buffer)
@@ -89,17 +107,24 @@ void Thread::run()
             task->run();
     }
 
-    if (_threadIndex == 0) {
+    if (index == 0) {
         // Tasks still waiting are dropped: they never run and never report.
         // Every slot is visited, not only front to rear: with all 64 slots
         // filled the two bounds meet. A slot is nulled when it is taken, so
         // only waiting tasks are found.
-        QMutexLocker locker(&_frontBoundMutex);
-        for (int n = 0; n < BufferSize; ++n) {
-            const int i = (_frontBound + n) % BufferSize;
-            delete _buffer[i];
-            _buffer[i] = nullptr;
+        QList<AbstractTask *> dropped;
+        {
+            QMutexLocker locker(&_frontBoundMutex);
+            for (int n = 0; n < BufferSize; ++n) {
+                const int i = (_frontBound + n) % BufferSize;
+                if (_buffer[i])
+                    dropped.append(_buffer[i]);
+                _buffer[i] = nullptr;
+            }
         }
+        // Deleted outside the lock: a task's destructor tells the observer,
+        // which must never wait for the ring while a worker holds it.
+        qDeleteAll(dropped);
     }
     _threadsCount.fetchAndSubOrdered(1);
     // Wakes the next sleeping worker, so one release stops them all in turn.

@@ -27,27 +27,41 @@ class KVTCOMMON_EXPORT Thread : public QThread
     Q_OBJECT
 
 public:
+    //! Number of slots in the ring shared by all workers.
     static const int BufferSize = 64;
 
+    //! Creates a worker; it takes tasks once start()ed.
     explicit Thread(QObject *parent = nullptr);
+    /*!
+     * Stops every worker (not only this one) and waits for this thread to end.
+     * Tasks still queued are deleted without running and never reach afterRun().
+     */
     ~Thread() override;
 
     /*!
      * Queues \a task for the workers; only the interface thread calls it.
      * Returns false at once, without taking the task, when it is null or no
-     * slot is free (also before any worker has started).
+     * slot is free (also before any worker has started), and once the
+     * workers have been stopped.
      */
     static bool put(AbstractTask *task);
 
-    int threadIndex() const { return _threadIndex; }
+    /*!
+     * The order in which this worker started (0 for the first), or -1 until its
+     * run() has begun. The ring accepts tasks once the first worker reached that
+     * point: wait until threadIndex() is not -1 before the first performTask().
+     */
+    int threadIndex() const { return _threadIndex.load(std::memory_order_acquire); }
 
 protected:
+    //! The worker loop: takes tasks from the ring and runs them until the workers stop.
     void run() override;
 
 private:
     static void takeFilledSlot();
 
-    int _threadIndex;
+    // Written by the worker when it starts, read by the interface thread.
+    std::atomic<int> _threadIndex;
 
     static AbstractTask *_buffer[BufferSize];
     static int _frontBound;
@@ -58,5 +72,7 @@ private:
     static std::atomic<bool> _stopThread;
     static QAtomicInt _threadsCount;
 };
+
+static_assert(sizeof(std::atomic<int>) == sizeof(int), "the thread index keeps the size of an int");
 
 #endif // KVT_THREAD_H

@@ -15,7 +15,11 @@
 class KVTCOMMON_EXPORT UpdateTask : public ElementTask
 {
 public:
+    /*!
+     * Creates the task with the changed properties in \a data (owned), usually the edit widget's exported record.
+     */
     UpdateTask(Element *element, ElementData *data);
+    //! Destroys the task and its record.
     ~UpdateTask() override;
 
     void afterRun() override;

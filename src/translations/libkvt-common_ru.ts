@@ -421,6 +421,14 @@
         <source>The task was not started: no worker thread is free.</source>
         <translation>Задача не запущена: нет свободного рабочего потока.</translation>
     </message>
+    <message>
+        <source>The task finished without reporting its outcome.</source>
+        <translation>Задача завершилась, не сообщив о результате.</translation>
+    </message>
+    <message>
+        <source>The task was dropped without running: the worker threads were stopped.</source>
+        <translation>Задача снята без запуска: рабочие потоки остановлены.</translation>
+    </message>
 </context>
 <context>
     <name>TaskObserverDialog</name>

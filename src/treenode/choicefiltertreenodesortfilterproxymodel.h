@@ -14,14 +14,21 @@ class KVTCOMMON_EXPORT ChoiceFilterTreeNodeSortFilterProxyModel : public FilterT
     Q_OBJECT
 
 public:
+    //! Creates a proxy of the ticked rows when \a checked is true, of the unticked ones otherwise.
     explicit ChoiceFilterTreeNodeSortFilterProxyModel(bool checked, QObject *parent = nullptr);
+    //! Destroys the proxy.
     ~ChoiceFilterTreeNodeSortFilterProxyModel() override;
 
+    //! Whether the proxy shows the ticked rows (true) or the unticked ones.
     bool checked() const { return _checked; }
 
 protected:
+    /*!
+     * Accepts a row that passes the flags and text filters and whose ticked state equals checked().
+     */
     bool filterAcceptsRow(int sourceRow, const QModelIndex &sourceParent) const override;
 
+    //! See checked().
     bool _checked;
 };
 

@@ -15,14 +15,19 @@ class KVTCOMMON_EXPORT ChoiceTreeNodeSortFilterProxyModel : public TreeNodeSortF
     Q_OBJECT
 
 public:
+    //! Creates a proxy of the ticked rows when \a checked is true, of the unticked ones otherwise.
     explicit ChoiceTreeNodeSortFilterProxyModel(bool checked, QObject *parent = nullptr);
+    //! Destroys the proxy.
     ~ChoiceTreeNodeSortFilterProxyModel() override;
 
+    //! Whether the proxy shows the ticked rows (true) or the unticked ones.
     bool checked() const { return _checked; }
 
 protected:
+    //! Accepts a row whose ticked state equals checked().
     bool filterAcceptsRow(int sourceRow, const QModelIndex &sourceParent) const override;
 
+    //! See checked().
     bool _checked;
 };
 

@@ -12,10 +12,14 @@ class KVTCOMMON_EXPORT ConfRootTreeNode : public TreeNode
     Q_OBJECT
 
 public:
+    //! Creates an empty root of depth 0 with an empty id.
     explicit ConfRootTreeNode(QObject *parent = nullptr);
+    //! Destroys the whole subtree (clearDeleteAll()).
     ~ConfRootTreeNode() override;
 
+    //! Two columns, "Name" and "Value".
     int columnCount() const override;
+    //! The translated "Name" and "Value" for the horizontal header.
     QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
 };
 

@@ -12,15 +12,25 @@ class KVTCOMMON_EXPORT ConfTreeNode : public TreeNode
     Q_OBJECT
 
 public:
+    /*!
+     * Creates the line \a name = \a value. The id becomes "Conf_<name>_<value>"
+     * and the expected depth 1, so loadTreeFromList() hangs it directly under the
+     * root.
+     */
     ConfTreeNode(const QString &name, const QString &value, QObject *parent = nullptr);
 
+    //! Column 0 the name, column 1 the value, for the display and tool-tip roles.
     QVariant data(int column, int role) const override;
 
+    //! The name shown in column 0.
     QString name() const { return _name; }
+    //! The value shown in column 1.
     QString value() const { return _value; }
 
 protected:
+    //! See name().
     QString _name;
+    //! See value().
     QString _value;
 };
 

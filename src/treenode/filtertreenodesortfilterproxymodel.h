@@ -17,12 +17,16 @@ class KVTCOMMON_EXPORT FilterTreeNodeSortFilterProxyModel : public TreeNodeSortF
     Q_OBJECT
 
 public:
+    //! Creates a proxy over every column; see TreeNodeSortFilterProxyModel.
     explicit FilterTreeNodeSortFilterProxyModel(int specialFlagsFilter, QObject *parent = nullptr);
+    //! Creates a proxy that shows and searches only the columns in \a acceptColumns.
     FilterTreeNodeSortFilterProxyModel(QSet<int> acceptColumns, int specialFlagsFilter,
                                        QObject *parent = nullptr);
+    //! Destroys the proxy.
     ~FilterTreeNodeSortFilterProxyModel() override;
 
 protected:
+    //! Accepts a row that passes the flags filter and matches the expression in an accepted column.
     bool filterAcceptsRow(int sourceRow, const QModelIndex &sourceParent) const override;
 };
 

@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <array>
+#include <type_traits>
 #include <cstdlib>
 #include <vector>
 
@@ -19,10 +20,24 @@ namespace {
 // An open-addressing table keeps key and row in one slot: a lookup of a node
 // among many thousands costs one cache line, as a hint stored in the node
 // itself would.
+//
+// The table has no destructor of its own, so its storage stays valid for the
+// whole life of its thread: nodes destroyed late (static objects destroyed at
+// exit, after the thread's own objects) still reach it. A separate releaser
+// frees the slots when the thread ends and marks the table closed; a closed
+// table answers "no hint" and records nothing more.
 class RowHints
 {
 public:
-    ~RowHints() { std::free(m_slots); }
+    void release()
+    {
+        std::free(m_slots);
+        m_slots = nullptr;
+        m_mask = 0;
+        m_count = 0;
+        m_shift = 64;
+        m_closed = true;
+    }
 
     int value(const TreeNode *node) const
     {
@@ -39,6 +54,8 @@ public:
 
     void insert(const TreeNode *node, int row)
     {
+        if (m_closed)
+            return;
         if ((m_count + 1) * 2 > m_mask + 1)
             grow();
         for (std::size_t i = slotOf(node);; i = (i + 1) & m_mask) {
@@ -112,12 +129,23 @@ private:
     std::size_t m_mask = 0;
     std::size_t m_count = 0;
     int m_shift = 64;
+    bool m_closed = false;
 };
+
+static_assert(std::is_trivially_destructible<RowHints>::value, "the row hints outlive the thread's other objects");
 
 thread_local RowHints rowHints;
 
+struct RowHintsReleaser
+{
+    ~RowHintsReleaser() { rowHints.release(); }
+};
+thread_local RowHintsReleaser rowHintsReleaser;
+
 void rememberRow(const TreeNode *node, int row)
 {
+    // Registers this thread's releaser before the table first allocates.
+    (void)&rowHintsReleaser;
     rowHints.insert(node, row);
 }
 
@@ -321,11 +349,9 @@ int TreeNode::indexOf(TreeNode *node, int from) const
 
 bool TreeNode::removeOne(TreeNode *node)
 {
-    int index = -1;
-    if (node && node->_parentNode == this)
-        index = node->row();
-    if (index < 0)
-        index = _childNodes.indexOf(node);
+    // The first occurrence, searched from the start: a list that a subclass
+    // filled with a repeated pointer loses the first one.
+    const int index = _childNodes.indexOf(node);
     if (index < 0)
         return false;
     removeAt(index, 1);

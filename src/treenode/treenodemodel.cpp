@@ -113,7 +113,8 @@ void TreeNodeModel::fetchMore(const QModelIndex &parent)
 
 bool TreeNodeModel::canFetchMore(const QModelIndex &parent) const
 {
-    if (!_rootNode || parent.column() > 0)
+    // Any column of a row asks that row's node.
+    if (!_rootNode)
         return false;
     const TreeNode *node = toTreeNode(parent);
     return node && node->canFetchMore();

@@ -25,13 +25,19 @@ class KVTCOMMON_EXPORT TreeNodeSortFilterProxyModel : public QSortFilterProxyMod
     Q_OBJECT
 
 public:
+    //! Creates a proxy that shows every column and filters rows by \a specialFlagsFilter.
     explicit TreeNodeSortFilterProxyModel(int specialFlagsFilter, QObject *parent = nullptr);
+    //! Creates a proxy that shows only the source columns in \a acceptColumns.
     TreeNodeSortFilterProxyModel(QSet<int> acceptColumns, int specialFlagsFilter,
                                  QObject *parent = nullptr);
+    //! Destroys the proxy.
     ~TreeNodeSortFilterProxyModel() override;
 
+    //! The filter mode given to the constructor (bits 1 and 2, see the class description).
     int specialFlagsFilter() const { return _specialFlagsFilter; }
+    //! The source columns shown; empty means all.
     QSet<int> acceptColumns() const;
+    //! Shows only the source columns in \a acceptColumns (all when empty), within one model reset.
     void setAcceptColumns(const QSet<int> &acceptColumns);
 
     TreeNode *rootNode() const override;
@@ -41,10 +47,14 @@ public:
     QModelIndex treeNodeToIndex(TreeNode *node) const override;
 
 protected:
+    //! Accepts the columns of acceptColumns(), or every column when it is empty.
     bool filterAcceptsColumn(int sourceColumn, const QModelIndex &sourceParent) const override;
+    //! Accepts a row by the special flags of its node (see the class description).
     bool filterAcceptsRow(int sourceRow, const QModelIndex &sourceParent) const override;
 
+    //! See specialFlagsFilter().
     int _specialFlagsFilter;
+    //! See acceptColumns().
     QSet<int> _acceptColumns;
 };
 

@@ -33,14 +33,21 @@ class KVTCOMMON_EXPORT AbstractChoiceDialog : public QDialog
     Q_OBJECT
 
 public:
+    /*!
+     * Builds the form with OK disabled; the subclass then sets _model and calls afterConstructor().
+     */
     explicit AbstractChoiceDialog(QWidget *parent = nullptr);
+    //! Destroys the dialog and its form.
     ~AbstractChoiceDialog() override;
 
     // Virtual interface added to QDialog's; the order of declaration is part
     // of the binary interface that plugins are built against.
+    //! Applies the selection; called when the dialog is accepted.
     virtual void makeChoice() = 0;
 
+    //! The subclass's proxy shown in the view.
     FilterTreeNodeSortFilterProxyModel *model() const { return _model; }
+    //! The columns of the model that the dialog shows.
     QSet<int> acceptColumns() const { return _acceptColumns; }
     /*! The columns of the model that the dialog shows (all when empty). */
     void setAcceptColumns(const QSet<int> &columns);
@@ -49,16 +56,26 @@ public:
     void afterConstructor();
 
 public Q_SLOTS:
+    //! Calls makeChoice(); connected to the dialog's acceptance.
     void choice();
+    //! Applies the pattern and its type (wildcard, regular expression, fixed string) to the proxy.
     void changeFilter();
+    /*!
+     * Asks the root element to show its children in display variant \a index (ChangeDisplayOperation).
+     */
     void changeDisplayVariant(int index);
+    //! Enables OK exactly while a row is selected.
     void selectionChanged();
 
 protected:
+    //! Fills the display-variant box on the first showing.
     void showEvent(QShowEvent *event) override;
 
+    //! The form; owned.
     Ui::AbstractChoiceDialog *_ui;
+    //! See model(); created by the subclass's constructor.
     FilterTreeNodeSortFilterProxyModel *_model;
+    //! See acceptColumns().
     QSet<int> _acceptColumns;
 
 private:

@@ -10,16 +10,24 @@
 class KVTCOMMON_EXPORT ChangeDisplayElementData : public ElementData
 {
 public:
+    //! Creates a request for display variant 0.
     ChangeDisplayElementData();
+    //! Creates a request for display variant \a displayType.
     explicit ChangeDisplayElementData(int displayType);
+    //! Copies the map and the display type.
     ChangeDisplayElementData(const ChangeDisplayElementData &other);
+    //! Copies the map and the display type.
     ChangeDisplayElementData &operator=(const ChangeDisplayElementData &other);
+    //! Destroys the record.
     ~ChangeDisplayElementData() override;
 
+    //! The index of the display variant asked for (see Element::displayChildrenVariants()).
     int displayType() const { return _displayType; }
+    //! Sets the display variant asked for.
     void setDisplayType(int displayType) { _displayType = displayType; }
 
 protected:
+    //! See displayType().
     int _displayType;
 };
 

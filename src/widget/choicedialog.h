@@ -15,11 +15,15 @@ class KVTCOMMON_EXPORT ChoiceDialog : public AbstractChoiceDialog
     Q_OBJECT
 
 public:
+    //! Creates the dialog with its not-ticked proxy; give it a model with setChoiceModel().
     explicit ChoiceDialog(QWidget *parent = nullptr);
+    //! Destroys the dialog; the choice model is not owned.
     ~ChoiceDialog() override;
 
+    //! Ticks every selected name in the choice model.
     void makeChoice() override;
 
+    //! Offers the names of \a model (not owned) that are not ticked.
     void setChoiceModel(ChoiceTreeNodeProxyModel *model);
 };
 

@@ -18,17 +18,24 @@ class KVTCOMMON_EXPORT ComboBoxDelegate : public MiscStyledItemDelegate
     Q_OBJECT
 
 public:
+    //! Creates the delegate.
     explicit ComboBoxDelegate(QObject *parent = nullptr);
+    //! Destroys the delegate.
     ~ComboBoxDelegate() override;
 
+    //! Paints the cell as a combo box showing the display text.
     void paint(QPainter *painter, const QStyleOptionViewItem &option, const QModelIndex &index) const override;
+    //! Creates an empty combo box that commits every selection.
     QWidget *createEditor(QWidget *parent, const QStyleOptionViewItem &option,
                           const QModelIndex &index) const override;
+    //! Selects the cell's index and, the first time, drops the list down.
     void setEditorData(QWidget *editor, const QModelIndex &index) const override;
+    //! Writes the selected index with Qt::EditRole.
     void setModelData(QWidget *editor, QAbstractItemModel *model, const QModelIndex &index) const override;
 
 protected:
     // Set by createEditor(), cleared once setEditorData() has opened the list.
+    //! Set by createEditor(), cleared once setEditorData() has opened the list.
     mutable bool _popupPending;
 };
 

@@ -71,12 +71,9 @@ Qt::ItemFlags ConfigureCheckModel::flags(const QModelIndex &index) const
 
 bool ConfigureCheckModel::setData(const QModelIndex &index, const QVariant &value, int role)
 {
-    // A row excluded by a ticked one is disabled in every view; ticking it
-    // anyway would tick two modes that exclude each other. Unticking stays
-    // possible, so a list loaded with such a pair can still be mended.
-    if (isRow(index) && role == Qt::CheckStateRole && value.toInt() == Qt::Checked
-        && isExcluded(index.row()))
-        return false;
+    // A row excluded by a ticked one is disabled in views, but the model
+    // itself still takes the change, as a plain check model would: the
+    // caller decides.
     if (!changeCheckState(index, value, role))
         return false;
     // Ticking or unticking one row can enable or disable any other.

@@ -21,9 +21,13 @@
 class KVTCOMMON_EXPORT ElementData : public QMap<QString, QVariant>
 {
 public:
+    //! Creates an empty record.
     ElementData();
+    //! Copies the map of \a other.
     ElementData(const ElementData &other);
+    //! Copies the map of \a other.
     ElementData &operator=(const ElementData &other);
+    //! Destroys the record.
     virtual ~ElementData();
 
     /*! Hook through which a plugin's own kind prepares its parameters; the
@@ -32,6 +36,7 @@ public:
 
     /*! The value under "name" as a string; empty when the key is absent. */
     QString name() const;
+    //! Stores \a name under "name".
     void setName(const QString &name);
 
     /*!

@@ -26,18 +26,26 @@ class KVTCOMMON_EXPORT ElementsElementWidget : public ListElementWidget
     Q_OBJECT
 
 public:
+    //! Creates the widget with element type \a type; see ListElementWidget.
     ElementsElementWidget(const QString &type, Module &module, RightsPredicate check,
                           QWidget *parent = nullptr);
+    //! Saves the header and filter when the widget has been read.
     ~ElementsElementWidget() override;
 
+    //! Lists the element's children (see the class description).
     void read() override;
 
+    //! Restores the header state and the filter of the element type from the settings.
     void loadSettings();
+    //! Stores the header state and the filter of the element type.
     void saveSettings() const;
 
 public Q_SLOTS:
+    //! Applies the filter type and text of the form to the list.
     void changeFilter();
+    //! Makes the element of \a index the current node of the tree.
     void choiceElement(const QModelIndex &index);
+    //! Relays the view's context menu request (see ListElementWidget).
     void customContextMenuRequest(const QPoint &pos);
 };
 

@@ -19,11 +19,15 @@ class KVTCOMMON_EXPORT ElementsWidgetProxyModel : public ListWidgetProxyModel
     Q_OBJECT
 
 public:
+    //! Creates the proxy; \a specialFlagsFilter as for TreeNodeSortFilterProxyModel.
     explicit ElementsWidgetProxyModel(int specialFlagsFilter, QObject *parent = nullptr);
+    //! Destroys the proxy.
     ~ElementsWidgetProxyModel() override;
 
 protected:
+    //! Hides the first column.
     bool filterAcceptsColumn(int sourceColumn, const QModelIndex &sourceParent) const override;
+    //! Accepts the first level below the root that passes the flags filter and matches the expression.
     bool filterAcceptsRow(int sourceRow, const QModelIndex &sourceParent) const override;
 };
 

@@ -35,7 +35,9 @@ class KVTCOMMON_EXPORT ElementTreeView : public QTreeView
     Q_OBJECT
 
 public:
+    //! Creates the view with the custom context menu policy.
     explicit ElementTreeView(QWidget *parent = nullptr);
+    //! Destroys the view.
     ~ElementTreeView() override;
 
     /*! Moves the connections listed under connectModel() from the old model
@@ -49,20 +51,31 @@ public:
      *  modelAboutToBeReset() and the selection model's selectionChanged() to
      *  this view. Calling it again adds no second connection. */
     void connectModel();
+    //! Removes the connections made by connectModel().
     void disconnectModel();
 
 Q_SIGNALS:
+    //! The current entry, or the structure below it, changed (see the class description).
     void currentElementChangedStructure(const QModelIndex &index = QModelIndex());
+    //! The view got the focus; \a element is the selected one, or null.
     void elementContextOperationChangedFocused(Element *element);
+    /*!
+     * The selection changed while the view has the focus; \a element is the newly selected one, or null.
+     */
     void elementContextOperationChangedSelected(Element *element);
+    //! The data of the selected \a element changed.
     void elementContextOperationChangedChanged(Element *element);
 
 public Q_SLOTS:
+    //! Reports a selection change; connected to the selection model.
     void emitCurrentElementChanged_Selection(const QItemSelection &selected);
+    //! Reports rows inserted or removed under a selected row; connected to the model.
     void emitCurrentElementChanged_InsertRemove(const QModelIndex &parent);
+    //! Reports a data change of a selected row; connected to the model.
     void emitCurrentElementChanged_Changed(const QModelIndex &topLeft, const QModelIndex &bottomRight);
 
 protected:
+    //! Emits elementContextOperationChangedFocused().
     void focusInEvent(QFocusEvent *event) override;
 };
 

@@ -1,8 +1,44 @@
 #include "elementwidget.h"
 
+#include "elementwidget_p.h"
+
 #include "element.h"
 
+#include <QSet>
 #include <QShowEvent>
+
+namespace {
+
+// Every element widget that exists, so that an element being destroyed can
+// find the widgets that still point at it. The widget keeps a plain pointer
+// (its layout is fixed); this table stands in for a guard. Never freed: a
+// widget destroyed during static destruction still finds it.
+QSet<ElementWidget *> &liveWidgets()
+{
+    static auto *widgets = new QSet<ElementWidget *>;
+    return *widgets;
+}
+
+// Reaches the protected pointer of any widget from outside the class.
+struct ElementWidgetAccess : ElementWidget
+{
+    static Element *ElementWidget::*elementField() { return &ElementWidgetAccess::_element; }
+};
+
+} // namespace
+
+void KvtElementWidgets::elementDestroyed(const Element *element)
+{
+    if (!element)
+        return;
+    Element *ElementWidget::*field = ElementWidgetAccess::elementField();
+    for (ElementWidget *widget : qAsConst(liveWidgets())) {
+        // Only the pointer is cleared, no virtual call: the element is half
+        // destroyed and the widget's own code must not be asked to look at it.
+        if (widget->*field == element)
+            widget->*field = nullptr;
+    }
+}
 
 ElementWidget::ElementWidget(Module &module, RightsPredicate check, QWidget *parent)
     : QWidget(parent)
@@ -12,9 +48,13 @@ ElementWidget::ElementWidget(Module &module, RightsPredicate check, QWidget *par
     , _element(nullptr)
     , _role(NoElementRole)
 {
+    liveWidgets().insert(this);
 }
 
-ElementWidget::~ElementWidget() = default;
+ElementWidget::~ElementWidget()
+{
+    liveWidgets().remove(this);
+}
 
 quint64 ElementWidget::availableOperations() const
 {

@@ -29,24 +29,44 @@ class KVTCOMMON_EXPORT ElementWidget : public QWidget, public ContextOperation
     Q_OBJECT
 
 public:
+    /*!
+     * Creates a widget of \a module whose editability \a check decides. Hand it
+     * to Module::insertElementWidget(), which owns it from then on. Priority 500,
+     * no element, NoElementRole.
+     */
     ElementWidget(Module &module, RightsPredicate check, QWidget *parent = nullptr);
+    //! Destroys the widget; the element is not touched.
     ~ElementWidget() override;
 
     // Virtual interface added to QWidget's; the order of declaration is part
     // of the binary interface that plugins are built against.
     quint64 availableOperations() const override;
     void performOperation(OperationType type, ElementData *data, int flags) override;
+    //! Hook for a widget that can show its element in more than one way. Does nothing here.
     virtual void setAlternativeExpected(int alternative);
+    /*!
+     * Assigns \a element (not owned; may be null) in \a role. Called by
+     * ElementWidgetContainer2 before it shows the widget and with null when it
+     * takes the widget away.
+     */
     virtual void setElement(Element *element, ElementWidgetRole role);
+    /*!
+     * Reads the element's content again. Called each time the program shows the
+     * widget. Does nothing here.
+     */
     virtual void read();
+    //! The text shown above the widget: the element's caption, or empty without element.
     virtual QString caption() const;
 
     /*! Orders widgets offered for one element: lower priority first. (The
      *  name is kept as plugins know it.) */
     static bool priorityLessThen(const ElementWidget *a, const ElementWidget *b);
 
+    //! The element shown, or null.
     Element *element() const { return _element; }
+    //! What the widget is doing with its element.
     ElementWidgetRole role() const { return _role; }
+    //! The order among the widgets shown for one element as tabs; lower first.
     int priority() const { return _priority; }
     /*! The supplement element type this widget stands for; "Undefined" for
      *  a widget that is not a supplement. */
@@ -58,11 +78,16 @@ Q_SIGNALS:
     void elementContextOperationChanged(Element *element);
 
 protected:
+    //! Calls read() when the program (not the window system) shows the widget.
     void showEvent(QShowEvent *event) override;
 
+    //! See supplementElementWidgetType(); a supplement widget sets it in its constructor.
     QString _supplementElementWidgetType;
+    //! See priority(); 500 unless the derived widget sets another.
     int _priority;
+    //! See element(); not owned.
     Element *_element;
+    //! See role().
     ElementWidgetRole _role;
 };
 

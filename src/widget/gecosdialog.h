@@ -24,7 +24,9 @@ class KVTCOMMON_EXPORT GecosDialog : public QDialog
     Q_OBJECT
 
 public:
+    //! Creates the dialog with empty sub-fields.
     explicit GecosDialog(QWidget *parent = nullptr);
+    //! Destroys the dialog.
     ~GecosDialog() override;
 
     /*! The four sub-fields, white space simplified, joined by exactly three
@@ -34,12 +36,15 @@ public:
      *  \a gecos; further parts are ignored, missing ones leave their field
      *  empty. */
     void setGecos(const QString &gecos);
+    //! Empties the four sub-fields.
     void clear();
 
 public Q_SLOTS:
+    //! Runs the dialog with the focus on the full name.
     int exec() override;
 
 protected:
+    //! The form; owned.
     Ui::GecosDialog *_ui;
 };
 

@@ -29,14 +29,18 @@ class KVTCOMMON_EXPORT ListElementWidget : public ElementWidget
     Q_OBJECT
 
 public:
+    //! Creates the widget with element type \a type and its ElementModel; see ElementWidget.
     ListElementWidget(const QString &type, Module &module, RightsPredicate check,
                       QWidget *parent = nullptr);
+    //! Destroys the widget, its model, proxy and form.
     ~ListElementWidget() override;
 
     /*! The tool tip of the listed element, or the window title without one. */
     QString toolTipText() const override;
 
+    //! The model whose root is the listed element.
     ElementModel *model() const { return _model; }
+    //! The proxy between model() and the view; made by the derived widget.
     ListWidgetProxyModel *proxy() const { return _proxy; }
     /*! The view of the form; null until a derived widget has built it. */
     ElementTreeView *elementTreeView() const;
@@ -54,8 +58,11 @@ protected:
      *  viewport, in global coordinates. */
     void relayContextMenuRequest(const QPoint &pos);
 
+    //! See model(); owned.
     ElementModel *_model;
+    //! See proxy(); owned, made by the derived widget.
     ListWidgetProxyModel *_proxy;
+    //! The form holding the view (and the filter controls of some widgets); owned.
     ListElementWidgetForm *_ui;
 };
 

@@ -17,7 +17,9 @@ class KVTCOMMON_EXPORT ListWidgetProxyModel : public FilterTreeNodeSortFilterPro
     Q_OBJECT
 
 public:
+    //! Creates the proxy; \a specialFlagsFilter as for TreeNodeSortFilterProxyModel.
     explicit ListWidgetProxyModel(int specialFlagsFilter, QObject *parent = nullptr);
+    //! Destroys the proxy.
     ~ListWidgetProxyModel() override;
 };
 

@@ -18,10 +18,15 @@ class KVTCOMMON_EXPORT MiscDelegateTableView : public QTableView
     Q_OBJECT
 
 public:
+    //! Creates the view.
     explicit MiscDelegateTableView(QWidget *parent = nullptr);
+    //! Destroys the view.
     ~MiscDelegateTableView() override;
 
 protected:
+    /*!
+     * Opens the editor of a MiscStyledItemDelegate cell on a single click (see the class description).
+     */
     bool edit(const QModelIndex &index, EditTrigger trigger, QEvent *event) override;
 };
 

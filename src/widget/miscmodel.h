@@ -16,13 +16,20 @@ class KVTCOMMON_EXPORT MiscModel : public QAbstractTableModel
     Q_OBJECT
 
 public:
+    //! Creates an empty model.
     explicit MiscModel(QObject *parent = nullptr);
+    //! Destroys the model.
     ~MiscModel() override;
 
+    //! One row per string; none under a row.
     int rowCount(const QModelIndex &parent = QModelIndex()) const override;
+    //! One column.
     int columnCount(const QModelIndex &parent = QModelIndex()) const override;
+    //! The row's string for the display and tool-tip roles.
     QVariant data(const QModelIndex &index, int role = Qt::DisplayRole) const override;
+    //! The translated "Data".
     QVariant headerData(int section, Qt::Orientation orientation, int role = Qt::DisplayRole) const override;
+    //! Selectable, enabled, never with children.
     Qt::ItemFlags flags(const QModelIndex &index) const override;
     using QAbstractTableModel::setData;
 
@@ -34,8 +41,10 @@ public:
     void clear();
 
 protected:
+    //! Whether \a index is a valid row of column 0.
     bool isRow(const QModelIndex &index) const;
 
+    //! The rows; see data().
     QList<QString> _data;
 };
 

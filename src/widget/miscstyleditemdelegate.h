@@ -18,9 +18,12 @@ class KVTCOMMON_EXPORT MiscStyledItemDelegate : public QStyledItemDelegate
     Q_OBJECT
 
 public:
+    //! Creates the delegate.
     explicit MiscStyledItemDelegate(QObject *parent = nullptr);
+    //! Destroys the delegate.
     ~MiscStyledItemDelegate() override;
 
+    //! Gives the editor exactly the cell's rectangle.
     void updateEditorGeometry(QWidget *editor, const QStyleOptionViewItem &option,
                               const QModelIndex &index) const override;
 

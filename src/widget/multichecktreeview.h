@@ -15,10 +15,13 @@ class KVTCOMMON_EXPORT MultiCheckTreeView : public QTreeView
     Q_OBJECT
 
 public:
+    //! Creates the view.
     explicit MultiCheckTreeView(QWidget *parent = nullptr);
+    //! Destroys the view.
     ~MultiCheckTreeView() override;
 
 protected:
+    //! Toggles all selected check boxes on the space bar.
     void keyPressEvent(QKeyEvent *event) override;
 };
 

@@ -16,14 +16,19 @@ class KVTCOMMON_EXPORT NodesElementWidget : public ListElementWidget
     Q_OBJECT
 
 public:
+    //! Creates the widget with element type \a type; see ListElementWidget.
     NodesElementWidget(const QString &type, Module &module, RightsPredicate check,
                        QWidget *parent = nullptr);
+    //! Destroys the widget.
     ~NodesElementWidget() override;
 
+    //! Makes the element the listed root on the first read; later reads change nothing.
     void read() override;
 
 public Q_SLOTS:
+    //! Makes the element of \a index the current node of the tree.
     void choiceElement(const QModelIndex &index);
+    //! Relays the view's context menu request (see ListElementWidget).
     void customContextMenuRequest(const QPoint &pos);
 };
 

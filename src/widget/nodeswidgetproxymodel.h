@@ -13,10 +13,13 @@ class KVTCOMMON_EXPORT NodesWidgetProxyModel : public ListWidgetProxyModel
     Q_OBJECT
 
 public:
+    //! Creates the proxy; \a specialFlagsFilter as for TreeNodeSortFilterProxyModel.
     explicit NodesWidgetProxyModel(int specialFlagsFilter, QObject *parent = nullptr);
+    //! Destroys the proxy.
     ~NodesWidgetProxyModel() override;
 
 protected:
+    //! Accepts the first level below the root that passes the special-flags filter.
     bool filterAcceptsRow(int sourceRow, const QModelIndex &sourceParent) const override;
 };
 

@@ -24,21 +24,28 @@ class KVTCOMMON_EXPORT PasswordDialog : public QDialog
     Q_OBJECT
 
 public:
+    //! Creates the dialog with empty fields.
     explicit PasswordDialog(QWidget *parent = nullptr);
+    //! Destroys the dialog.
     ~PasswordDialog() override;
 
+    //! The login as typed.
     QString user() const;
+    //! The password as typed.
     QString password() const;
     /*! Sets the login; the same text as shown is left alone, so the cursor
      *  stays and no change is signalled. */
     void setUser(const QString &user);
 
 public Q_SLOTS:
+    //! Enables OK exactly while login and password are both filled in.
     void checkValid();
 
 protected:
+    //! Puts the focus on the login with its text selected.
     void showEvent(QShowEvent *event) override;
 
+    //! The form; owned.
     Ui::PasswordDialog *_ui;
 };
 

@@ -19,16 +19,22 @@ class KVTCOMMON_EXPORT PasswordInputDialog : public QDialog
     Q_OBJECT
 
 public:
+    //! Creates the dialog with empty fields.
     explicit PasswordInputDialog(QWidget *parent = nullptr);
+    //! Destroys the dialog.
     ~PasswordInputDialog() override;
 
+    //! The new password as typed.
     QString password() const;
 
 public Q_SLOTS:
+    //! Enables OK exactly while the password is not empty and repeated exactly.
     void validate();
+    //! Runs the dialog with both fields emptied.
     int exec() override;
 
 protected:
+    //! The form; owned.
     Ui::PasswordInputDialog *_ui;
 };
 

@@ -27,31 +27,48 @@ class KVTCOMMON_EXPORT PreviewDialog : public QDialog
     Q_OBJECT
 
 public:
+    /*!
+     * The preview of the process, created by the first call with \a parent; later calls ignore \a parent.
+     */
     static PreviewDialog *instance(QWidget *parent = nullptr);
+    //! Saves the geometry and deletes the printer.
     ~PreviewDialog() override;
 
     /*! Shows \a html and runs the dialog; returns the result of exec(). */
     int preview(const QString &html);
 
+    //! Restores the geometry from "previewDialog/previewDialogGeometry" when stored.
     void loadSettings();
+    //! Stores the geometry under "previewDialog/previewDialogGeometry".
     void saveSettings() const;
 
+    //! The document shown.
     const QString &html() const { return _html; }
     /*! The kept printer; null before the first print. */
     QPrinter *printer() const { return _printer; }
 
 public Q_SLOTS:
+    //! Empties the preview.
     void clear();
+    /*!
+     * Asks for a file name (default "print.html") and writes the document there with an ExportHtmlTask.
+     */
     void exportHtml();
+    //! Prints the document through the print dialog.
     void print();
 
 protected:
+    //! Use instance().
     explicit PreviewDialog(QWidget *parent = nullptr);
 
+    //! The form; owned.
     Ui::PreviewDialog *_ui;
+    //! See html().
     QString _html;
+    //! See printer(); owned.
     QPrinter *_printer;
 
+    //! The instance of the process, or null.
     static PreviewDialog *_instance;
 };
 

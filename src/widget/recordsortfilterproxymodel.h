@@ -16,10 +16,13 @@ class KVTCOMMON_EXPORT RecordSortFilterProxyModel : public QSortFilterProxyModel
     Q_OBJECT
 
 public:
+    //! Creates the proxy.
     explicit RecordSortFilterProxyModel(QObject *parent = nullptr);
+    //! Destroys the proxy.
     ~RecordSortFilterProxyModel() override;
 
 protected:
+    //! Accepts a row whose display text matches the expression in some column.
     bool filterAcceptsRow(int sourceRow, const QModelIndex &sourceParent) const override;
 };
 

@@ -19,23 +19,34 @@ class TreeNode;
 class KVTCOMMON_EXPORT ServiceHeavyElementData : public ServiceLightElementData
 {
 public:
+    //! Creates an empty record.
     ServiceHeavyElementData();
+    //! Copies everything but the nodes: the new record's data() starts empty.
     ServiceHeavyElementData(const ServiceHeavyElementData &other);
+    //! Copies everything but the nodes: data() is left as it was.
     ServiceHeavyElementData &operator=(const ServiceHeavyElementData &other);
+    //! Deletes every node of data() with its whole subtree.
     ~ServiceHeavyElementData() override;
 
     /*! The owned nodes, modifiable in place. A node put here is destroyed
      *  with the record; take it out first to keep it. */
     QList<TreeNode *> &data() { return _data; }
 
+    //! The path of the service's configuration file.
     const QString &configFile() const { return _configFile; }
+    //! Sets the path of the configuration file.
     void setConfigFile(const QString &configFile) { _configFile = configFile; }
+    //! The text of the configuration file.
     const QString &configData() const { return _configData; }
+    //! Sets the text of the configuration file.
     void setConfigData(const QString &configData) { _configData = configData; }
 
 protected:
+    //! See data(); the nodes are owned.
     QList<TreeNode *> _data;
+    //! See configData().
     QString _configData;
+    //! See configFile().
     QString _configFile;
 };
 

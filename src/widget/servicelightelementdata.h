@@ -10,12 +10,18 @@
 class KVTCOMMON_EXPORT ServiceLightElementData : public ElementData
 {
 public:
+    //! Creates a record of a stopped service with an empty state text (state not known yet).
     ServiceLightElementData();
+    //! Copies the map, the state and the state text.
     ServiceLightElementData(const ServiceLightElementData &other);
+    //! Copies the map, the state and the state text.
     ServiceLightElementData &operator=(const ServiceLightElementData &other);
+    //! Destroys the record.
     ~ServiceLightElementData() override;
 
+    //! Whether the service runs.
     bool state() const { return _state; }
+    //! The text shown for the state; empty while the state is not known.
     const QString &textState() const { return _textState; }
 
     /*! Stores \a state; an empty \a textState is replaced by the translated
@@ -23,7 +29,9 @@ public:
     void setState(bool state, const QString &textState = QString());
 
 protected:
+    //! See state().
     bool _state;
+    //! See textState().
     QString _textState;
 };
 

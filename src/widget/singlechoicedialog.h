@@ -17,9 +17,14 @@ class KVTCOMMON_EXPORT SingleChoiceDialog : public AbstractChoiceDialog
     Q_OBJECT
 
 public:
+    /*!
+     * Creates the dialog over the tree under \a rootNode (not owned; may be set later through treeNodeModel()).
+     */
     explicit SingleChoiceDialog(TreeNode *rootNode = nullptr, QWidget *parent = nullptr);
+    //! Destroys the dialog and its model; the tree is not touched.
     ~SingleChoiceDialog() override;
 
+    //! Stores the selected node as choosenTreeNode().
     void makeChoice() override;
 
     /*! The node chosen when the dialog was last accepted, or null. (The
@@ -29,9 +34,12 @@ public:
     TreeNodeModel *treeNodeModel() const { return _treeNodeModel; }
 
 protected:
+    //! Clears the selection, so each showing starts without a choice.
     void showEvent(QShowEvent *event) override;
 
+    //! See treeNodeModel(); owned.
     TreeNodeModel *_treeNodeModel;
+    //! See choosenTreeNode().
     TreeNode *_choosenTreeNode;
 };
 

@@ -13,12 +13,17 @@ class KVTCOMMON_EXPORT SpinBoxDelegate : public MiscStyledItemDelegate
     Q_OBJECT
 
 public:
+    //! Creates the delegate.
     explicit SpinBoxDelegate(QObject *parent = nullptr);
+    //! Destroys the delegate.
     ~SpinBoxDelegate() override;
 
+    //! Creates a spin box that commits every change.
     QWidget *createEditor(QWidget *parent, const QStyleOptionViewItem &option,
                           const QModelIndex &index) const override;
+    //! Shows the cell's Qt::EditRole value.
     void setEditorData(QWidget *editor, const QModelIndex &index) const override;
+    //! Writes the editor's value with Qt::EditRole.
     void setModelData(QWidget *editor, QAbstractItemModel *model, const QModelIndex &index) const override;
 };
 

@@ -14,8 +14,13 @@ class KVTCOMMON_EXPORT SupplementElementsElementWidget : public ElementsElementW
     Q_OBJECT
 
 public:
+    /*!
+     * Creates the widget with element type \a type, standing for supplements of
+     * that type, with \a title as its window title (the tab title).
+     */
     SupplementElementsElementWidget(const QString &type, const QString &title, Module &module,
                                     RightsPredicate check, QWidget *parent = nullptr);
+    //! Destroys the widget.
     ~SupplementElementsElementWidget() override;
 };
 

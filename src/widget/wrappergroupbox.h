@@ -16,7 +16,9 @@ class KVTCOMMON_EXPORT WrapperGroupBox : public QGroupBox
     Q_OBJECT
 
 public:
+    //! Creates the empty frame.
     explicit WrapperGroupBox(QWidget *parent = nullptr);
+    //! Destroys the frame; a widget still held is taken out first, not deleted.
     ~WrapperGroupBox() override;
 
     /*! Removes the widget held so far and shows \a widget instead; a null

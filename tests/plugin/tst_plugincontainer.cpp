@@ -9,6 +9,8 @@
 #include "treestring.h"
 
 #include <QApplication>
+#include <QPushButton>
+#include <QTimer>
 #include <QtTest>
 
 #include <memory>
@@ -172,6 +174,45 @@ private Q_SLOTS:
         for (int r = 0; r < model->rowCount(top); ++r)
             rows.append(model->index(r, 0, top).data().toString() + '|' + model->index(r, 1, top).data().toString());
         QTEST(rows, "modules");
+    }
+
+    void reentrantLoad()
+    {
+        // Events are processed between files and between a plugin's modules.
+        // A load or unload asked for meanwhile (here by a timer firing at each
+        // pass) waits until the running load is done, and the plugin dialog
+        // offers no Change during it.
+        container->showPluginDialog();
+        QPushButton *change = nullptr;
+        for (QWidget *w : QApplication::topLevelWidgets())
+            if (!change && w->inherits("PluginDialog"))
+                change = w->findChild<QPushButton *>(QStringLiteral("_changePushButton"));
+        QVERIFY(change && change->isEnabled());
+
+        int ticks = 0;
+        QStringList changeOffered;
+        QTimer timer;
+        timer.setInterval(0);
+        connect(&timer, &QTimer::timeout, this, [&] {
+            changeOffered.append(change->isEnabled() ? "yes" : "no");
+            if (++ticks == 3)
+                container->unloadPlugins();
+            else if (ticks < 20)
+                container->loadPlugins(pluginDir);
+            else
+                timer.stop();
+        });
+        timer.start();
+        container->loadPlugins(pluginDir);
+        timer.stop();
+
+        QVERIFY2(ticks > 12, "the timer fired between files and between modules");
+        QVERIFY(!changeOffered.isEmpty() && !changeOffered.contains(QStringLiteral("yes")));
+        QVERIFY(change->isEnabled());
+        // The last request was a load: one set of plugins and modules.
+        QCOMPARE(TreeString::fromModel(container->treeNodeModel()), QStringLiteral("alpha[alpha-child] beta delta"));
+        QCOMPARE(container->plugins().size(), 7);
+        QCOMPARE(container->modules().size(), 4);
     }
 };
 

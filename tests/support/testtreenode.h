@@ -8,8 +8,8 @@
 /*!
  * A node for tests: shows its id in column 0 and "<id>:<column>" in the other
  * columns, accepts edits of column 0 (the edit becomes its display text), and
- * lets a test choose its column count and special flags, record afterLoad()
- * calls and count destructions.
+ * lets a test choose its column count, special flags and whether it can fetch
+ * more, record afterLoad() calls and count destructions.
  */
 class TestTreeNode : public TreeNode
 {
@@ -25,9 +25,11 @@ public:
     bool setData(int column, const QVariant &value, int role) override;
     int treeNodeSpecialFlags() const override { return specialFlags; }
     void afterLoad() override { if (afterLoadLog) afterLoadLog->append(id()); }
+    bool canFetchMore() const override { return fetchable; }
 
     int columns = 2;
     int specialFlags = 0;
+    bool fetchable = false;
     QString text;
     QStringList *afterLoadLog = nullptr; // appended with the id on afterLoad()
     int *destructionCount = nullptr;     // incremented by the destructor

@@ -106,6 +106,112 @@ private Q_SLOTS:
         QTRY_COMPARE(int(running.destroyed), 1);
         QCOMPARE(int(running.afterRuns), 1);
     }
+
+    void stoppedRingLetsGoOfTasks()
+    {
+        // Tasks given to the observer and dropped by the stop: their rows let
+        // go of them (no flags read, no stop request written through them) and
+        // end as failed instead of running for ever.
+        TaskObserver *observer = TaskObserver::instance();
+        TaskObserverModel *model = observer->model();
+        worker->start();
+        QTRY_COMPARE(worker->threadIndex(), 0);
+        observer->performTask(new TestTask(&running, QStringLiteral("blocker"), TaskDescription::Success, &gate));
+        QVERIFY(running.started.tryAcquire(1, 5000));
+        for (int i = 1; i <= 3; ++i)
+            observer->performTask(new TestTask(&queued, QString::number(i), TaskDescription::Success, nullptr, true));
+        QCOMPARE(model->index(1, 1).data(Qt::UserRole).toULongLong(), quint64(AbstractTask::StoppableFlag));
+        std::thread opener([this] {
+            std::this_thread::sleep_for(std::chrono::milliseconds(100));
+            gate.release();
+        });
+        worker.reset();
+        opener.join();
+        // A stopped ring takes nothing more: such a task would never run nor
+        // be freed.
+        TestTask late(nullptr, QStringLiteral("late"));
+        QVERIFY(!Thread::put(&late));
+        QCOMPARE(int(queued.destroyed), 3);
+        QTRY_COMPARE(observer->runningCount(), 0);
+        for (int row = 1; row <= 3; ++row) {
+            QVERIFY(!observer->rows().at(row).task);
+            QCOMPARE(model->index(row, 1).data(Qt::EditRole).toInt(), int(TaskDescription::Fail));
+            QCOMPARE(model->index(row, 1).data(Qt::UserRole).toULongLong(), quint64(0));
+            QVERIFY(!model->setData(model->index(row, 1), 4, Qt::EditRole));
+        }
+        QCOMPARE(model->index(0, 1).data(Qt::EditRole).toInt(), int(TaskDescription::Success));
+        QCOMPARE(observer->problemCount(), 3);
+
+        // Through the observer, a task the stopped ring refuses is reported
+        // failed and freed.
+        TestTask::Counters refused;
+        QTest::ignoreMessage(QtWarningMsg, QRegularExpression(QStringLiteral("\"after stop\" refused")));
+        observer->performTask(new TestTask(&refused, QStringLiteral("after stop")));
+        QCOMPARE(int(refused.destroyed), 1);
+        QCOMPARE(observer->runningCount(), 0);
+    }
+
+    void completionsReachTheInterfaceThread()
+    {
+        // No observer yet: a task queued directly reports to an observer made
+        // in the interface thread, where its afterRun() runs. A worker asking
+        // for the observer gets none rather than making one.
+        tester.reset();
+        delete TaskObserver::instance();
+        worker->start();
+        QTRY_COMPARE(worker->threadIndex(), 0);
+        TaskObserver *fromWorker = reinterpret_cast<TaskObserver *>(1);
+        QTest::ignoreMessage(QtWarningMsg, QRegularExpression(QStringLiteral("cannot be created outside the interface thread")));
+        std::thread([&fromWorker] { fromWorker = TaskObserver::instance(); }).join();
+        QVERIFY(!fromWorker);
+
+        struct Where : TestTask
+        {
+            Where(TestTask::Counters *counters, const QString &name, QThread **thread)
+                : TestTask(counters, name), thread(thread)
+            {
+            }
+            void afterRun() override
+            {
+                *thread = QThread::currentThread();
+                TestTask::afterRun();
+            }
+            void run() override
+            {
+                TestTask::run();
+                posted->release(); // the completion is on its way
+            }
+            QThread **thread;
+            QSemaphore *posted = nullptr;
+        };
+        QThread *afterRunThread = nullptr;
+        QSemaphore posted;
+        TestTask::Counters first;
+        auto *early = new Where(&first, QStringLiteral("early"), &afterRunThread);
+        early->posted = &posted;
+        QVERIFY(Thread::put(early));
+        QTRY_COMPARE(int(first.destroyed), 1);
+        QCOMPARE(int(first.afterRuns), 1);
+        QCOMPARE(afterRunThread, qApp->thread());
+        QCOMPARE(TaskObserver::instance()->thread(), qApp->thread());
+
+        // The observer destroyed with one completion already posted and one
+        // task still running: both tasks are finished and freed.
+        TaskObserver *observer = TaskObserver::instance();
+        TestTask::Counters second;
+        auto *quick = new Where(&second, QStringLiteral("quick"), &afterRunThread);
+        quick->posted = &posted;
+        observer->performTask(quick);
+        QVERIFY(posted.tryAcquire(2, 5000)); // no event is processed meanwhile
+        observer->performTask(new TestTask(&second, QStringLiteral("slow"), TaskDescription::Success, &gate));
+        QVERIFY(second.started.tryAcquire(2, 5000));
+        delete observer;
+        QCOMPARE(int(second.afterRuns), 1);
+        QCOMPARE(int(second.destroyed), 1);
+        gate.release();
+        QTRY_COMPARE(int(second.destroyed), 2);
+        QCOMPARE(int(second.afterRuns), 2);
+    }
 };
 
 QTEST_MAIN(ThreadTest)

@@ -118,6 +118,18 @@ private Q_SLOTS:
         QVERIFY(root->removeOne(many.at(1)));
         QVERIFY(!root->removeOne(many.at(1)));
         QCOMPARE(many.at(1)->row(), -1);
+
+        // A list holding a node twice (filled through childNodes()) loses the
+        // first occurrence, wherever the node was last seen.
+        const Tree twice = tree(QString());
+        TreeNode *x = new TestTreeNode(QStringLiteral("x"), twice.get());
+        TreeNode *a = new TestTreeNode(QStringLiteral("a"), twice.get());
+        twice->append({x, a});
+        twice->childNodes().prepend(a);
+        QSignalSpy removal(twice.get(), &TreeNode::nodesAboutToBeRemoved);
+        QVERIFY(twice->removeOne(a));
+        QCOMPARE(removal.value(0).value(1).toInt(), 0);
+        QCOMPARE(twice->childNodes(), (QList<TreeNode *>{x, a}));
         for (int i = root->childNodesCount() - 1; i >= 0; i -= 5)
             QCOMPARE(root->childNodes().at(i)->row(), i);
         for (int i = 0; i < root->childNodesCount(); ++i)

@@ -190,6 +190,11 @@ private Q_SLOTS:
         QVERIFY(!model->hasChildren(index("a")));
         QCOMPARE(model->rowCount(index("a")), 1);
         QVERIFY(model->hasChildren(index("b")));
+        // Any column of a row asks that row's node whether it can fetch more.
+        node("b/b1")->fetchable = true;
+        const QModelIndex b1 = index("b/b1");
+        QVERIFY(model->canFetchMore(b1) && model->canFetchMore(b1.sibling(b1.row(), 1)));
+        QVERIFY(!model->canFetchMore(index("a").sibling(0, 1)));
         root->emitNodeDataChanged();
         QCOMPARE(log->take(), QStringList{"changed(root, root)"});
     }

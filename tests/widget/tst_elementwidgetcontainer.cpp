@@ -156,6 +156,31 @@ private Q_SLOTS:
             QVERIFY2(widget && !widget->parent() && !widget->element() && widget->role() == NoElementRole, type);
         }
     }
+
+    void deletedElementIsLetGo()
+    {
+        // An element deleted while its widget is shown (as a delete task does
+        // outside force-reread mode, its parent staying on display with tabs):
+        // the widget lets go of it, and neither the tab nor the caption
+        // reaches it again.
+        select("staff");
+        Element *s1 = qobject_cast<Element *>(ElementTreeString::find(root.get(), "s1"));
+        s1->parentNode()->removeOne(s1);
+        delete s1;
+        QVERIFY(!module->elementWidget("extra")->element());
+        log.clear();
+        QTabBar *bar = tabs()->tabBar();
+        QTest::mouseClick(bar, Qt::LeftButton, {}, bar->tabRect(2).center());
+        QCOMPARE(log, QStringList());
+        QCOMPARE(shown(), QStringLiteral("tabs[Note(s2) Group(staff) Extra(null)*] caption=staff"));
+
+        // The element behind a single widget and its caption.
+        select("bob");
+        delete ElementTreeString::find(root.get(), "bob");
+        QVERIFY(!module->elementWidget("user")->element());
+        container->updateCaption();
+        QCOMPARE(shown(), QStringLiteral("single[User(null)*]"));
+    }
 };
 
 QTEST_MAIN(ElementWidgetContainerTest)
