@@ -24,8 +24,12 @@ out=$(cd "$out" && pwd)
 start=$SECONDS
 
 sh scripts/install-deps.sh package
-# Exactly the build dependencies the packages declare, the documentation's too.
-apt build-dep "$source_dir"
+# Exactly the build dependencies the packages declare, the documentation's too;
+# the package lists are refreshed only when something is missing.
+if ! (cd "$source_dir" && dpkg-checkbuilddeps >/dev/null 2>&1); then
+    apt update
+    apt build-dep "$source_dir"
+fi
 
 # A clean copy: dpkg-buildpackage writes into the tree and beside it.
 rm -rf "$out/src"
