@@ -30,7 +30,7 @@ public:
 public Q_SLOTS:
     //! Enables OK exactly while the password is not empty and repeated exactly.
     void validate();
-    //! Runs the dialog with both fields emptied.
+    //! Runs the dialog (QDialog::exec()); the fields keep what they hold.
     int exec() override;
 
 protected:
