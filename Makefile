@@ -1,6 +1,7 @@
 # Thin wrapper over CMake. The build folder is build/ (build-asan/ for the
 # address sanitizer build, build-tsan/ for the thread sanitizer build,
-# build-fuzz/ for the fuzz targets).
+# build-fuzz/ for the fuzz targets). Each command installs only the Debian
+# packages it needs.
 
 BUILD      ?= build
 ASAN_BUILD ?= build-asan
@@ -15,46 +16,55 @@ JOBS       ?= $(shell nproc 2>/dev/null || echo 2)
 CMAKE_ARGS ?=
 PREFIX     ?= /usr/local
 
-.PHONY: all deps configure build test demo bench install asan-test tsan-test fuzz fuzz-run clean lupdate docs
+.PHONY: all configure build test demo bench install asan-test tsan-test fuzz fuzz-run clean lupdate docs deb
 
 all: build
 
-deps:
-	sh scripts/install-deps.sh
-
 configure:
-	cmake -S . -B $(BUILD) -DKVT_BUILD_BENCH=ON -DCMAKE_INSTALL_PREFIX=$(PREFIX) $(CMAKE_ARGS)
+	cmake -S . -B $(BUILD) -DCMAKE_INSTALL_PREFIX=$(PREFIX) $(CMAKE_ARGS)
 
 build: configure
 	cmake --build $(BUILD) -j $(JOBS)
 
-test: deps build
+# The benchmarks are outside the default build: neither `make test` nor
+# `make demo` compiles them.
+test:
+	sh scripts/install-deps.sh test
+	$(MAKE) build
 	cd $(BUILD) && ctest --output-on-failure -j $(JOBS)
 
 # kvt-admin on a sandbox of copied /etc files (apps/kvt-admin/demo.sh); only
 # the tool and its plugins are built.
-demo: deps configure
+demo:
+	sh scripts/install-deps.sh demo
+	$(MAKE) configure
 	cmake --build $(BUILD) -j $(JOBS) --target kvt-admin
 	sh apps/kvt-admin/demo.sh $(BUILD) $(ARGS)
 
-bench: deps build
+bench:
+	sh scripts/install-deps.sh bench
+	cmake -S . -B $(BUILD) -DKVT_BUILD_BENCH=ON -DCMAKE_INSTALL_PREFIX=$(PREFIX) $(CMAKE_ARGS)
+	cmake --build $(BUILD) -j $(JOBS) --target kvt_benchmarks
 	sh scripts/run-benchmarks.sh $(BUILD)
 
 install: build
 	cmake --install $(BUILD)
 
-asan-test: deps
+asan-test:
+	sh scripts/install-deps.sh test
 	cmake -S . -B $(ASAN_BUILD) -DCMAKE_BUILD_TYPE=Debug -DKVT_SANITIZE=ON $(CMAKE_ARGS)
 	cmake --build $(ASAN_BUILD) -j $(JOBS)
 	cd $(ASAN_BUILD) && ctest --output-on-failure -j $(JOBS)
 
-tsan-test: deps
+tsan-test:
+	sh scripts/install-deps.sh test
 	cmake -S . -B $(TSAN_BUILD) -DCMAKE_BUILD_TYPE=Debug -DKVT_TSAN=ON -DKVT_BUILD_EXAMPLES=OFF $(CMAKE_ARGS)
 	cmake --build $(TSAN_BUILD) -j $(JOBS) --target $(TSAN_TARGETS)
 	cd $(TSAN_BUILD) && ctest --output-on-failure -j $(JOBS) -R '$(TSAN_TESTS)'
 
 # libFuzzer targets (clang) for the parsers and the configuration line handling.
-fuzz: deps
+fuzz:
+	sh scripts/install-deps.sh fuzz
 	cmake -S fuzz -B $(FUZZ_BUILD) -DCMAKE_CXX_COMPILER=clang++ $(CMAKE_ARGS)
 	cmake --build $(FUZZ_BUILD) -j $(JOBS)
 
@@ -68,6 +78,11 @@ docs:
 	sh scripts/install-deps.sh docs
 	cmake -S . -B $(BUILD) -DKVT_BUILD_DOCS=ON -DCMAKE_INSTALL_PREFIX=$(PREFIX) $(CMAKE_ARGS)
 	cmake --build $(BUILD) --target docs
+
+# Debian packages of the tree, written to ../ as dpkg-buildpackage does.
+deb:
+	sh scripts/install-deps.sh package
+	dpkg-buildpackage -us -uc -b
 
 lupdate: configure
 	cmake --build $(BUILD) --target lupdate

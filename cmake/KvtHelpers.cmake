@@ -11,24 +11,26 @@ function(kvt_sources)
 endfunction()
 
 # kvt_public_headers(<header>...): adds installed headers of the current folder.
-# Each one gets a forwarding header in the build tree so that code built
-# against the build tree includes it exactly as an installed consumer does:
-# #include <kvt-common/name.h>.
+# Each one gets a symbolic link in the build tree's include/kvt-common/, so that
+# code built against the build tree sees exactly the installed layout: it
+# writes #include <kvt-common/name.h>, and the headers' own "sibling.h"
+# includes resolve inside that one folder as they do once installed.
 function(kvt_public_headers)
     foreach(h IN LISTS ARGN)
         set(abs "${CMAKE_CURRENT_SOURCE_DIR}/${h}")
         target_sources(KvtCommon PRIVATE "${abs}")
         set_property(GLOBAL APPEND PROPERTY KVT_PUBLIC_HEADERS "${abs}")
         get_filename_component(name "${h}" NAME)
-        set(fwd "${KVT_FORWARD_INCLUDE_DIR}/kvt-common/${name}")
-        set(content "#include \"${abs}\"\n")
-        if(EXISTS "${fwd}")
-            file(READ "${fwd}" old)
+        set(link "${KVT_FORWARD_INCLUDE_DIR}/kvt-common/${name}")
+        if(IS_SYMLINK "${link}")
+            file(READ_SYMLINK "${link}" old)
         else()
             set(old "")
         endif()
-        if(NOT old STREQUAL content)
-            file(WRITE "${fwd}" "${content}")
+        if(NOT old STREQUAL abs)
+            file(REMOVE "${link}")
+            file(MAKE_DIRECTORY "${KVT_FORWARD_INCLUDE_DIR}/kvt-common")
+            file(CREATE_LINK "${abs}" "${link}" SYMBOLIC)
         endif()
     endforeach()
 endfunction()

@@ -35,7 +35,15 @@ if(KVT_TSAN)
     add_link_options(-fsanitize=thread)
 endif()
 
-# Where translations live once installed, and where the build tree keeps them.
+# Where translations live once installed. The build tree mirrors the install
+# layout (the library in <build>/<libdir>, translations in <build>/<datadir>/...)
+# so that the library finds its translations from its own location in both.
 set(KVT_TRANSLATIONS_INSTALL_DIR "${CMAKE_INSTALL_DATADIR}/brel/translations")
-set(KVT_TRANSLATIONS_BUILD_DIR "${PROJECT_BINARY_DIR}/translations")
+set(KVT_TRANSLATIONS_BUILD_DIR "${PROJECT_BINARY_DIR}/${KVT_TRANSLATIONS_INSTALL_DIR}")
+set(KVT_LIBRARY_BUILD_DIR "${PROJECT_BINARY_DIR}/${CMAKE_INSTALL_LIBDIR}")
+# The translations folder as seen from the library's folder: a relative path
+# that does not depend on the install prefix, so changing the prefix does not
+# rebuild the library.
+file(RELATIVE_PATH KVT_TRANSLATIONS_FROM_LIBDIR "/prefix/${CMAKE_INSTALL_LIBDIR}"
+     "/prefix/${KVT_TRANSLATIONS_INSTALL_DIR}")
 set(KVT_FORWARD_INCLUDE_DIR "${PROJECT_BINARY_DIR}/include")

@@ -1,14 +1,24 @@
 #!/bin/sh
-# Installs the Debian packages needed to build, test, benchmark and run the
-# demo of libkvt-common. Only missing packages are installed, and the package
-# lists are refreshed only when something is missing. Works as root or
-# through sudo.
+# Installs the Debian packages that one command of the project needs, and
+# nothing more:
 #
-# Usage: install-deps.sh [docs]
-#   docs   also the tools of the API reference (Doxygen, qhelpgenerator)
+#   install-deps.sh [build|test|demo|bench|fuzz|package|docs|lint]...
+#
+#   build    compile the library, its examples and translations (the default)
+#   test     build + run the tests (X server for the GUI tests, the tools the
+#            tests drive, a PostgreSQL server for the cluster tests)
+#   demo     build + run kvt-admin on its sandbox
+#   bench    build + run the benchmarks (Google Benchmark)
+#   fuzz     build + run the fuzz targets (clang with libFuzzer)
+#   package  build the Debian packages (debhelper, lintian, test tools)
+#   docs     build the API reference (Doxygen, qhelpgenerator)
+#   lint     check licence information (reuse)
+#
+# Only missing packages are installed, and the package lists are refreshed only
+# when something is missing. Works as root or through sudo.
 set -eu
 
-packages="
+build="
 cmake
 make
 g++
@@ -17,33 +27,66 @@ qtbase5-dev
 libqt5xmlpatterns5-dev
 qttools5-dev
 qttools5-dev-tools
-libqt5svg5
+"
+test="
 xvfb
 xauth
-libbenchmark-dev
+libqt5svg5
 dpkg
 coreutils
 util-linux
 postgresql
 postgresql-client
+"
+fuzz="
 clang
 libclang-rt-dev
 "
-
-# The API reference is built only on request (make docs, CI).
-docs_packages="
+demo="
+libqt5svg5
+"
+bench="
+libbenchmark-dev
+"
+package="
+debhelper
+dpkg-dev
+fakeroot
+lintian
+xvfb
+xauth
+"
+docs="
 doxygen
 qhelpgenerator-qt5
 "
-for arg in "$@"; do
-    case "$arg" in
-        docs) packages="$packages $docs_packages" ;;
-        *) echo "install-deps: unknown argument '$arg' (expected: docs)" >&2; exit 2 ;;
+lint="
+reuse
+"
+
+[ $# -gt 0 ] || set -- build
+packages="$build"
+for command in "$@"; do
+    case "$command" in
+        build) ;;
+        test) packages="$packages $test" ;;
+        demo) packages="$packages $demo" ;;
+        bench) packages="$packages $bench" ;;
+        fuzz) packages="$packages $fuzz" ;;
+        package) packages="$packages $package" ;;
+        docs) packages="$packages $docs" ;;
+        lint) packages="$packages $lint" ;;
+        *)
+            echo "install-deps: unknown command '$command'" >&2
+            echo "install-deps: use build, test, demo, bench, fuzz, package, docs or lint" >&2
+            exit 2
+            ;;
     esac
 done
 
 missing=""
 for p in $packages; do
+    case " $missing " in *" $p "*) continue ;; esac
     status=$(dpkg-query -W -f='${Status}' "$p" 2>/dev/null || true)
     case "$status" in
         "install ok installed") ;;
@@ -52,7 +95,7 @@ for p in $packages; do
 done
 
 if [ -z "$missing" ]; then
-    echo "install-deps: all packages present"
+    echo "install-deps: all packages present for: $*"
     exit 0
 fi
 

@@ -1,5 +1,6 @@
 #include "serviceelement.h"
 
+#include "kvticons_p.h"
 #include "servicelightelementdata.h"
 
 #include <QGuiApplication>
@@ -37,7 +38,7 @@ QIcon ServiceElement::startIcon()
 {
     if (!canLoadThemeIcons())
         return QIcon();
-    static const QIcon icon = QIcon::fromTheme(QStringLiteral("media-playback-start"));
+    static const QIcon icon = kvtThemeIcon(QStringLiteral("media-playback-start"));
     return icon;
 }
 
@@ -45,6 +46,6 @@ QIcon ServiceElement::stopIcon()
 {
     if (!canLoadThemeIcons())
         return QIcon();
-    static const QIcon icon = QIcon::fromTheme(QStringLiteral("media-playback-stop"));
+    static const QIcon icon = kvtThemeIcon(QStringLiteral("media-playback-stop"));
     return icon;
 }

@@ -3,6 +3,7 @@
 #include "module.h"
 #include "plugin.h"
 #include "plugincontainer.h"
+#include "kvticons_p.h"
 
 #include <QIcon>
 #include <QPluginLoader>
@@ -144,8 +145,8 @@ QVariant PluginModel::data(const QModelIndex &index, int role) const
     if (index.column() == 0) {
         switch (role) {
         case Qt::DecorationRole:
-            return QIcon::fromTheme(plugin ? QStringLiteral("task-complete")
-                                           : QStringLiteral("task-reject"));
+            return kvtThemeIcon(plugin ? QStringLiteral("task-complete")
+                                       : QStringLiteral("task-reject"));
         case Qt::DisplayRole:
             return plugin ? plugin->name() : loader->fileName();
         case Qt::ToolTipRole:

@@ -6,8 +6,12 @@
 #include <QDialog>
 
 /*!
- * A small modal dialog that keeps the user from starting more work while a
- * task's first second passes. It deletes itself when closed.
+ * A modal dialog that keeps the user from starting more work while a task's
+ * first second passes. It deletes itself when closed.
+ *
+ * It is not meant to be seen: it has no frame and no content and is one
+ * transparent pixel large; while it is shown the application shows the busy
+ * cursor.
  */
 class KVTCOMMON_EXPORT BlockDialog : public QDialog
 {

@@ -1,6 +1,7 @@
 #include "taskobservermodel.h"
 
 #include "abstracttask.h"
+#include "kvticons_p.h"
 #include "taskobserver.h"
 
 #include <QIcon>
@@ -74,14 +75,14 @@ QIcon statusIcon(int status)
 {
     switch (status) {
     case TaskDescription::Processing:
-        return QIcon::fromTheme(QStringLiteral("task-ongoing"));
+        return kvtThemeIcon(QStringLiteral("task-ongoing"));
     case TaskDescription::Fail:
-        return QIcon::fromTheme(QStringLiteral("task-reject"));
+        return kvtThemeIcon(QStringLiteral("task-reject"));
     case TaskDescription::Success:
-        return QIcon::fromTheme(QStringLiteral("task-complete"));
+        return kvtThemeIcon(QStringLiteral("task-complete"));
     case TaskDescription::Warning:
     case TaskDescription::AboutToBeStopped:
-        return QIcon::fromTheme(QStringLiteral("task-attention"));
+        return kvtThemeIcon(QStringLiteral("task-attention"));
     default:
         return QIcon();
     }

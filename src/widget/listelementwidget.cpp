@@ -46,6 +46,11 @@ void ListElementWidget::connectView()
             SIGNAL(elementContextOperationChanged( Element * )));
     connect(view, SIGNAL(customContextMenuRequested( QPoint )), this,
             SLOT(customContextMenuRequest( QPoint )));
+    // A sortable list opens sorted ascending on its first column (the header
+    // alone would start descending); a stored header state restored later
+    // takes precedence.
+    if (view->isSortingEnabled())
+        view->header()->setSortIndicator(0, Qt::AscendingOrder);
 }
 
 void ListElementWidget::chooseElement(const QModelIndex &index)

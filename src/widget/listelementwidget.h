@@ -48,7 +48,8 @@ public:
 protected:
     /*! Connects the view to the slots choiceElement(QModelIndex) and
      *  customContextMenuRequest(QPoint) that the derived widget declares,
-     *  and its element signals to elementContextOperationChanged(). */
+     *  and its element signals to elementContextOperationChanged(). A view
+     *  with sorting enabled is set to sort ascending on its first column. */
     void connectView();
     /*! Makes the element of the proxy index \a index the current node of
      *  the tree, clearing the view's selection first. */

@@ -7,6 +7,7 @@
 
 #include <QAbstractItemModelTester>
 #include <QApplication>
+#include <QCursor>
 #include <QDialogButtonBox>
 #include <QPlainTextEdit>
 #include <QPushButton>
@@ -34,11 +35,17 @@ class TaskObserverTest : public QObject
     template <typename W>
     W *child(const char *name) const { return dialog()->findChild<W *>(QLatin1String(name)); }
     QDialogButtonBox *buttonBox() const { return child<QDialogButtonBox>("_buttonBox"); }
-    static bool blockDialogShown()
+    static BlockDialog *shownBlockDialog()
     {
         const QWidgetList all = QApplication::topLevelWidgets();
-        return std::any_of(all.begin(), all.end(),
-                           [](QWidget *w) { return qobject_cast<BlockDialog *>(w) && w->isVisible(); });
+        auto it = std::find_if(all.begin(), all.end(),
+                               [](QWidget *w) { return qobject_cast<BlockDialog *>(w) && w->isVisible(); });
+        return it == all.end() ? nullptr : static_cast<BlockDialog *>(*it);
+    }
+    static bool blockDialogShown() { return shownBlockDialog(); }
+    static bool busyCursor()
+    {
+        return QGuiApplication::overrideCursor() && QGuiApplication::overrideCursor()->shape() == Qt::BusyCursor;
     }
     int status(int row) const { return model->index(row, 1).data(Qt::EditRole).toInt(); }
     bool requestStop(int row) { return model->setData(model->index(row, 1), 4, Qt::EditRole); }
@@ -102,13 +109,19 @@ private Q_SLOTS:
         observer->performTask(nullptr);
         QCOMPARE(model->rowCount(), 1);
         // Work has started: the window is blocked and closing is not possible.
-        QVERIFY(blockDialogShown());
+        // The blocking dialog is modal but not seen (no grey box over the
+        // window): frameless, a pixel large; the busy cursor shows the work.
+        const BlockDialog *block = shownBlockDialog();
+        QVERIFY(block && block->isModal() && block->testAttribute(Qt::WA_DeleteOnClose));
+        QVERIFY((block->windowFlags() & Qt::FramelessWindowHint) && block->width() * block->height() <= 1);
+        QVERIFY(busyCursor());
         QVERIFY(!buttonBox()->isEnabled());
         QVERIFY(!dialog()->isVisible());
         if (slow) {
             // After a second the task dialog takes over, still not closable.
             QTRY_VERIFY_WITH_TIMEOUT(dialog()->isVisible(), 3000);
             QTRY_VERIFY(!blockDialogShown());
+            QVERIFY(!QGuiApplication::overrideCursor());
             QTest::keyClick(dialog(), Qt::Key_Escape);
             QVERIFY(!dialog()->close());
             QVERIFY(dialog()->isVisible());
@@ -117,6 +130,7 @@ private Q_SLOTS:
         QTRY_COMPARE(observer->runningCount(), 0);
         QVERIFY(buttonBox()->isEnabled());
         QTRY_VERIFY(!blockDialogShown());
+        QVERIFY(!QGuiApplication::overrideCursor());
         // A success closes the dialog and clears the list; a problem leaves both
         // for the user to read, until the dialog is closed.
         const bool problem = shown != TaskDescription::Success;
