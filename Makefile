@@ -1,3 +1,6 @@
+# SPDX-FileCopyrightText: 2026 The libkvt-common developers
+# SPDX-License-Identifier: LGPL-2.1-or-later
+
 # Thin wrapper over CMake. The build folder is build/ (build-asan/ for the
 # address sanitizer build, build-tsan/ for the thread sanitizer build,
 # build-fuzz/ for the fuzz targets). Each command installs only the Debian

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // Filling an element tree: every element inserted below an element root is
 // announced to its module (InsertedOperation) and every removed one too
 // (RemovedOperation). Measured beside QStandardItemModel filling and

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // Filtering a long element list by a regular expression: a
 // FilterTreeNodeSortFilterProxyModel over an ElementModel beside a
 // QSortFilterProxyModel over a QStandardItemModel holding the same rows,

@@ -1,3 +1,6 @@
+# SPDX-FileCopyrightText: 2026 The libkvt-common developers
+# SPDX-License-Identifier: LGPL-2.1-or-later
+
 # Loading a directory of 50 plugins of 20 modules each through
 # PluginContainer::loadPlugins, beside a bare QPluginLoader loop (load and
 # instance) over the same files. The plugins are one source built 50 times

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // Loading a plugin directory: PluginContainer::loadPlugins (unload what is
 // loaded, walk the directory, load and check every file, collect and hang
 // the modules, announce one reset) beside the bare QPluginLoader work on the

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // The plugin of the plugin-loading benchmark, built 50 times, once per
 // KVT_BENCH_PLUGIN_INDEX, with KVT_BENCH_MODULES modules each: module 0 of a
 // plugin directly below the module root, the others below it.

@@ -1,1 +1,4 @@
+# SPDX-FileCopyrightText: 2026 The libkvt-common developers
+# SPDX-License-Identifier: LGPL-2.1-or-later
+
 kvt_add_benchmark(bench_task "${CMAKE_CURRENT_LIST_DIR}/task_bench.cpp")

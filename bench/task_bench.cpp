@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // Short tasks through the task observer and its worker ring (two workers),
 // beside the same work through QThreadPool with a queued call back to the
 // interface thread per task. Both are fed as slots free: 64 tasks (the size of

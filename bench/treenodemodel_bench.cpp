@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // TreeNodeModel beside QStandardItemModel on the same shapes: building a tree
 // under a connected model, walking it the way a view does, and data-changed
 // notifications on random nodes. Also loadTreeFromList growth.

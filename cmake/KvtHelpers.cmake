@@ -1,3 +1,6 @@
+# SPDX-FileCopyrightText: 2026 The libkvt-common developers
+# SPDX-License-Identifier: LGPL-2.1-or-later
+
 # Helpers used by the subsystem folders of src/.
 
 # kvt_sources(<file>...): adds sources (and private headers) of the current

@@ -1,4 +1,6 @@
 #!/bin/sh
+# SPDX-FileCopyrightText: 2026 The libkvt-common developers
+# SPDX-License-Identifier: LGPL-2.1-or-later
 # Installs the Debian packages that one command of the project needs, and
 # nothing more:
 #

@@ -1,4 +1,6 @@
 #!/bin/sh
+# SPDX-FileCopyrightText: 2026 The libkvt-common developers
+# SPDX-License-Identifier: LGPL-2.1-or-later
 # Runs every benchmark program of a build folder (default: build) on the
 # offscreen platform. Extra arguments go to each program, for example
 # --benchmark_filter=Walk.

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // Rewriting a 200 000-line configuration file, changing 1 000 keys, with
 // RegExpHandler::rewriteSystemConfigureFile beside `sed -i` making the same
 // edit with one script. Both start from a fresh copy of the same file on

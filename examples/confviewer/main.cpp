@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // Shows a key/value file (default /etc/os-release) as a tree of configuration
 // nodes. Without a display the window is rendered offscreen to a PNG file and
 // the listing is printed on standard output.

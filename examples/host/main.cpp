@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // The demo host: the frame of an administration tool built on the library.
 //
 //   kvt-demo-host [plugin directory]

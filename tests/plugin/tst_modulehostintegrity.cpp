@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // Module::isAdministrator against a stand-in of the host integrity library,
 // found through LD_LIBRARY_PATH. Built twice: with the real query in the
 // library (KVT_HOST_QUERY_EXPECTED 1) and with a function of the same name

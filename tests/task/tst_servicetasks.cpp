@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 #include <kvt-common/controlservicetask.h>
 #include <kvt-common/elementroottreenode.h>
 #include <kvt-common/readpropertylightservicetask.h>

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // The worker ring is process-wide and stopping it is final, so every test
 // function here runs in a process of its own (see CMakeLists.txt).
 

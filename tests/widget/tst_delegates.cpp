@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 #include <kvt-common/comboboxdelegate.h>
 #include <kvt-common/lineeditdelegate.h>
 #include <kvt-common/miscdelegatetableview.h>

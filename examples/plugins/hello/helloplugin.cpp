@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // hello: the smallest plugin worth copying.
 //
 // A plugin is a shared object whose root object derives from Plugin. The

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // Stands in for the host integrity library in tests. It answers from the
 // environment (KVT_TEST_MAX_MIC=0 means "not at the highest level") and
 // counts how often it was asked.

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The libkvt-common developers
+// SPDX-License-Identifier: LGPL-2.1-or-later
+
 // One plugin source, built several times with different definitions:
 //   TEST_PLUGIN_NAME     display name
 //   TEST_PLUGIN_MASK     available operation classes
