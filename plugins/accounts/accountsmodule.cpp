@@ -344,28 +344,8 @@ uint Accounts::firstHumanUid(const QString &loginDefs)
 }
 
 AccountsGroupElement::AccountsGroupElement(Module &module, const QString &type, const QString &title)
-    : ContainerElement(module, KvtAdmin::mayChangeSystem)
+    : KvtAdmin::TopLevelGroup(module, type, title)
 {
-    _elementType = type;
-    _groupElementType = type;
-    setTitle(title);
-    _expectedDepth = 1;
-}
-
-quint64 AccountsGroupElement::availableOperations() const
-{
-    return ReadContentOperation | ResetOperation;
-}
-
-void AccountsGroupElement::performOperation(OperationType type, ElementData *data, int flags)
-{
-    if (type == ResetOperation) {
-        if (canFetchMore())
-            fetchMore();
-        return;
-    }
-    if (type == ReadContentOperation)
-        ContainerElement::performOperation(type, data, flags);
 }
 
 QString AccountsGroupElement::toolTipText() const

@@ -4,6 +4,8 @@
 #ifndef KVT_ADMIN_ACCOUNTSMODULE_H
 #define KVT_ADMIN_ACCOUNTSMODULE_H
 
+#include "../shared/toplevelgroup.h"
+
 #include <kvt-common/containerelement.h>
 #include <kvt-common/loginelement.h>
 #include <kvt-common/module.h>
@@ -65,14 +67,12 @@ uint firstHumanUid(const QString &loginDefs = QStringLiteral("/etc/login.defs"))
 
 /*! A persistent node ("Users" or "Groups") whose children are read from the
  *  account databases. */
-class AccountsGroupElement : public ContainerElement
+class AccountsGroupElement : public KvtAdmin::TopLevelGroup
 {
     Q_OBJECT
 
 public:
     AccountsGroupElement(Module &module, const QString &type, const QString &title);
-    quint64 availableOperations() const override;
-    void performOperation(OperationType type, ElementData *data, int flags) override;
     QString toolTipText() const override;
 };
 

@@ -98,7 +98,8 @@ UserWidget::UserWidget(AccountsModule &module, QWidget *parent)
 
     connect(_gecosPushButton, SIGNAL(clicked()), this, SLOT(changeGecos()));
     connect(_passwordPushButton, SIGNAL(clicked()), this, SLOT(changePassword()));
-    connect(_applyPushButton, SIGNAL(clicked()), this, SLOT(applyContentChanges()));
+    // applyContentChanges() is a virtual function, not a slot.
+    connect(_applyPushButton, &QPushButton::clicked, this, [this] { applyContentChanges(); });
     connect(_choiceModel, SIGNAL(stateChanged()), this, SLOT(choiceChanged()));
     connect(this, &ViewEditElementWidget::contentChanged, _applyPushButton,
             [this](int state) { _applyPushButton->setEnabled(state == 3); });

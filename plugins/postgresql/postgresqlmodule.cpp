@@ -238,28 +238,8 @@ QString Pgsql::ClusterInfo::line() const
 }
 
 ClustersGroupElement::ClustersGroupElement(Module &module)
-    : ContainerElement(module, KvtAdmin::mayChangeSystem)
+    : KvtAdmin::TopLevelGroup(module, Pgsql::groupType, PostgresqlModule::tr("PostgreSQL clusters"))
 {
-    _elementType = Pgsql::groupType;
-    _groupElementType = Pgsql::groupType;
-    setTitle(PostgresqlModule::tr("PostgreSQL clusters"));
-    _expectedDepth = 1;
-}
-
-quint64 ClustersGroupElement::availableOperations() const
-{
-    return ReadContentOperation | ResetOperation;
-}
-
-void ClustersGroupElement::performOperation(OperationType type, ElementData *data, int flags)
-{
-    if (type == ResetOperation) {
-        if (canFetchMore())
-            fetchMore();
-        return;
-    }
-    if (type == ReadContentOperation)
-        ContainerElement::performOperation(type, data, flags);
 }
 
 QString ClustersGroupElement::toolTipText() const

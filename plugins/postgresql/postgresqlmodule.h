@@ -4,6 +4,8 @@
 #ifndef KVT_ADMIN_POSTGRESQLMODULE_H
 #define KVT_ADMIN_POSTGRESQLMODULE_H
 
+#include "../shared/toplevelgroup.h"
+
 #include <kvt-common/containerelement.h>
 #include <kvt-common/module.h>
 #include <kvt-common/ordinaryelement.h>
@@ -48,14 +50,12 @@ struct ClusterInfo
 
 /*! The persistent "PostgreSQL clusters" node; its children are read with
  *  the library's asynchronous cluster manager. */
-class ClustersGroupElement : public ContainerElement
+class ClustersGroupElement : public KvtAdmin::TopLevelGroup
 {
     Q_OBJECT
 
 public:
     explicit ClustersGroupElement(Module &module);
-    quint64 availableOperations() const override;
-    void performOperation(OperationType type, ElementData *data, int flags) override;
     QString toolTipText() const override;
 };
 

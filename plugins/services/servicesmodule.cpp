@@ -195,31 +195,8 @@ private:
 } // namespace
 
 ServicesGroupElement::ServicesGroupElement(Module &module)
-    : ContainerElement(module, KvtAdmin::mayChangeSystem)
+    : KvtAdmin::TopLevelGroup(module, Services::groupType, ServicesModule::tr("Services"))
 {
-    _elementType = Services::groupType;
-    _groupElementType = Services::groupType;
-    setTitle(ServicesModule::tr("Services"));
-    _expectedDepth = 1;
-}
-
-quint64 ServicesGroupElement::availableOperations() const
-{
-    // Services are listed, never created here.
-    return ReadContentOperation | ResetOperation;
-}
-
-void ServicesGroupElement::performOperation(OperationType type, ElementData *data, int flags)
-{
-    if (type == ResetOperation) {
-        // The first read right after the element tree is built, so the list
-        // is there before the user expands the node.
-        if (canFetchMore())
-            fetchMore();
-        return;
-    }
-    if (type == ReadContentOperation)
-        ContainerElement::performOperation(type, data, flags);
 }
 
 QString ServicesGroupElement::toolTipText() const

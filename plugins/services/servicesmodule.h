@@ -6,6 +6,8 @@
 
 #include "servicebackend.h"
 
+#include "../shared/toplevelgroup.h"
+
 #include <kvt-common/containerelement.h>
 #include <kvt-common/module.h>
 #include <kvt-common/serviceelement.h>
@@ -37,14 +39,12 @@ enum ServiceOperation : quint64 {
  * The persistent "Services" node: its children, the host's services, are
  * read when it is first expanded, or right after the element tree is built.
  */
-class ServicesGroupElement : public ContainerElement
+class ServicesGroupElement : public KvtAdmin::TopLevelGroup
 {
     Q_OBJECT
 
 public:
     explicit ServicesGroupElement(Module &module);
-    quint64 availableOperations() const override;
-    void performOperation(OperationType type, ElementData *data, int flags) override;
     QString toolTipText() const override;
 };
 

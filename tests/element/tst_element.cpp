@@ -303,8 +303,9 @@ private Q_SLOTS:
         if (running >= 0)
             light->setState(running, QStringLiteral("text"));
         const QIcon icon = service.data(0, Qt::DecorationRole).value<QIcon>();
-        QCOMPARE(icon.name(), themePresent ? expectedIcon : QString());
-        QCOMPARE(icon.isNull(), expectedIcon.isEmpty() || !themePresent);
+        // Without a matching theme the library's own copy of the icon answers.
+        QCOMPARE(icon.name(), expectedIcon);
+        QCOMPARE(icon.isNull(), expectedIcon.isEmpty());
     }
 
     void supplementLoginMixin()

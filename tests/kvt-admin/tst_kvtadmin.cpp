@@ -355,8 +355,8 @@ void TestKvtAdmin::failingTaskOpensTaskDialog_data()
     QTest::addColumn<QString>("message");
 
     // Root writes through any mode bits: a folder in the way of the work
-    // copy makes the write fail for root and everyone else alike.
-    QTest::newRow("unwritable") << false << "sample.conf.tmp\" error";
+    // copy makes the rewrite refuse for root and everyone else alike.
+    QTest::newRow("unwritable") << false << "sample.conf.tmp\" is not a regular file of its own";
     QTest::newRow("file removed") << true << "sample.conf\" not exists";
 }
 
